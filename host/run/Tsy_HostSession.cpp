@@ -1,0 +1,350 @@
+#include "run/Tsy_HostSession.h"
+
+#include "db/Tsy_WizData.h"
+#include "design/Tsy_DesignFile.h"
+#include "design/Tsy_OutputSet.h"
+#include "hdl/Tsy_HdlNames.h"
+#include "lib/Tsy_DataDir.h"
+#include "lib/Tsy_DeviceCatalog.h"
+#include "lib/Tsy_PrimitiveLibrary.h"
+#include "port/Exception.h"
+#include "run/Tsy_PluginLoader.h"
+#include "run/Tsy_WizardCatalog.h"
+#include "wiz/Port_Stream.h"
+#include "wiz/Tsy_WizMain.h"
+
+#include <cerrno>
+#include <cstring>
+#include <sys/stat.h>
+
+namespace {
+
+bool lowerEquals(const std::string& a, const std::string& b)
+{
+    return StringBase(a).EqualsNoCase(b);
+}
+
+bool isDirectory(const std::string& path)
+{
+    struct stat st {};
+    return ::stat(path.c_str(), &st) == 0 && S_ISDIR(st.st_mode);
+}
+
+// Creates the folder and its missing parents.
+bool makeDirectories(const std::string& path, std::string& error)
+{
+    if (path.empty() || isDirectory(path))
+        return true;
+    size_t slash = path.find_last_of('/');
+    if (slash != std::string::npos && slash > 0 && !makeDirectories(path.substr(0, slash), error))
+        return false;
+    if (::mkdir(path.c_str(), 0755) != 0 && errno != EEXIST) {
+        error = path + ": cannot create the output folder: " + std::strerror(errno);
+        return false;
+    }
+    return true;
+}
+
+bool parseOnOff(const std::string& value, bool& on)
+{
+    StringBase v(value);
+    if (v.EqualsNoCase("on") || v.EqualsNoCase("true") || v == "1") {
+        on = true;
+        return true;
+    }
+    if (v.EqualsNoCase("off") || v.EqualsNoCase("false") || v == "0") {
+        on = false;
+        return true;
+    }
+    return false;
+}
+
+} // namespace
+
+bool Tsy_ParseSetting(const std::string& text, bool pinSetting, Tsy_Setting& out, std::string& error)
+{
+    const char* shape = pinSetting ? "TARGET.PIN=on|off" : "TARGET.ATTR=VALUE or TARGET.PIN.ATTR=VALUE";
+    size_t eq = text.find('=');
+    if (eq == std::string::npos || eq == 0) {
+        error = "'" + text + "' is not of the form " + shape;
+        return false;
+    }
+    std::string left = text.substr(0, eq);
+    out = Tsy_Setting();
+    out.value = text.substr(eq + 1);
+    size_t dot = left.find('.');
+    if (dot == std::string::npos || dot == 0 || dot + 1 == left.size()) {
+        error = "'" + text + "' is not of the form " + shape;
+        return false;
+    }
+    out.target = left.substr(0, dot);
+    std::string rest = left.substr(dot + 1);
+    size_t dot2 = rest.find('.');
+    if (pinSetting) {
+        out.pin = rest;
+        if (dot2 != std::string::npos) {
+            error = "'" + text + "' is not of the form " + shape;
+            return false;
+        }
+        bool on = false;
+        if (!parseOnOff(out.value, on)) {
+            error = "'" + text + "': the pin state must be on or off";
+            return false;
+        }
+        return true;
+    }
+    if (dot2 == std::string::npos) {
+        out.name = rest;
+    } else {
+        out.pin = rest.substr(0, dot2);
+        out.name = rest.substr(dot2 + 1);
+        if (out.pin.empty() || out.name.empty() || out.name.find('.') != std::string::npos) {
+            error = "'" + text + "' is not of the form " + shape;
+            return false;
+        }
+    }
+    return true;
+}
+
+std::unique_ptr<Tsy_WizData> Tsy_NewDesignFor(const Tsy_PartInfo& part)
+{
+    auto data = std::make_unique<Tsy_WizData>(Tsy_PrimitiveLibrary::Instance());
+    for (const auto& t : part.family->templates)
+        data->AddTemplateBlock(t);
+    return data;
+}
+
+Tsy_WizContext Tsy_ContextForPart(const Tsy_PartInfo& part)
+{
+    const Tsy_FamilyInfo& fam = *part.family;
+    Tsy_WizContext ctx;
+    ctx.partName = part.part;
+    ctx.familyName = fam.key;
+    ctx.deviceName = part.device;
+    ctx.devicePrefix = fam.prefix;
+    ctx.speedGrade = part.speedGrade;
+    ctx.dcmPrimName = fam.dcmPrimitive;
+    for (const auto& t : part.deviceInfo->traits)
+        ctx.deviceTraits.push_back(t);
+    ctx.performanceModeKeys = fam.Has("performance_modes");
+    ctx.pmcdFamily = fam.Has("pmcd");
+    ctx.bufgctrlFamily = fam.Has("bufgctrl");
+    ctx.bufgmuxCtrlFamily = fam.Has("bufgmux_ctrl");
+    ctx.defaultSetup = true;
+    return ctx;
+}
+
+Tsy_HostSession::Tsy_HostSession(Port::Stream& stream) : stream_(stream) {}
+
+Tsy_HostSession::~Tsy_HostSession() = default;
+
+int Tsy_HostSession::Prepare(const Tsy_RunOptions& options, std::string& error)
+{
+    options_ = options;
+    try {
+        if (!checkOptions(options, error) || !makeDatabase(error) || !makeWizard(error))
+            return kUsage;
+    } catch (const Port::Exception& e) {
+        error = e.what();
+        return kUsage;
+    }
+    return kOk;
+}
+
+bool Tsy_HostSession::checkOptions(const Tsy_RunOptions& o, std::string& error)
+{
+    wizards_ = Tsy_WizardCatalog::LoadFile(Tsy_DataFile("wizards.json"));
+    Tsy_DesignHeader header;
+    if (!o.designFile.empty()) {
+        header = Tsy_DesignFile::ReadHeader(o.designFile);
+        loadedVersion_ = header.version.str();
+    }
+    wizardKey_ = o.wizard.empty() ? header.wizard.str() : o.wizard;
+    part_ = o.part.empty() ? header.part.str() : o.part;
+    module_ = !o.module.empty() ? o.module : !header.module.IsEmpty() ? header.module.str() : kDefaultModule;
+
+    if (!o.designFile.empty() && !o.wizard.empty() && !lowerEquals(o.wizard, header.wizard.str())) {
+        error = "--wizard " + o.wizard + ": " + o.designFile + " is a '" + header.wizard.str() + "' design";
+        return false;
+    }
+    if (wizardKey_.empty() || part_.empty()) {
+        error = "give a design file, or both --wizard and --part";
+        return false;
+    }
+    const Tsy_WizardInfo* info = wizards_->Find(wizardKey_);
+    if (!info) {
+        error = "--wizard " + wizardKey_ + ": unknown wizard type (see 'pendra wizards')";
+        return false;
+    }
+    wizardKey_ = info->key;
+    Tsy_PartInfo part;
+    if (!Tsy_DeviceCatalog::Instance().FindPart(part_, part)) {
+        error = "--part " + part_ + ": unknown part (see 'pendra parts')";
+        return false;
+    }
+    part_ = part.part;
+    std::string missing = Tsy_WizardCatalog::MissingCapability(*info, *part.family);
+    if (!missing.empty()) {
+        error = "--wizard " + wizardKey_ + ": the " + part.family->name + " family of part " + part_ +
+                " cannot build it (it has no " + missing + ")";
+        return false;
+    }
+    std::string problem = Tsy_HdlNameProblem(module_);
+    if (!problem.empty()) {
+        error = "--module " + module_ + ": not a legal Verilog and VHDL name: it " + problem;
+        return false;
+    }
+    Tsy_Setting s;
+    for (const auto& text : o.sets)
+        if (!Tsy_ParseSetting(text, false, s, error)) {
+            error = "--set " + error;
+            return false;
+        }
+    for (const auto& text : o.pins)
+        if (!Tsy_ParseSetting(text, true, s, error)) {
+            error = "--pin " + error;
+            return false;
+        }
+    if (!o.designFile.empty()) {
+        Tsy_PartInfo loaded;
+        if (Tsy_DeviceCatalog::Instance().FindPart(header.part.str(), loaded))
+            loadedFamily_ = loaded.family->key;
+        else
+            loadedFamily_ = "";
+    }
+    return true;
+}
+
+bool Tsy_HostSession::makeDatabase(std::string&)
+{
+    Tsy_PartInfo part;
+    Tsy_DeviceCatalog::Instance().FindPart(part_, part);
+    data_ = Tsy_NewDesignFor(part);
+    if (options_.designFile.empty())
+        return true;
+    Tsy_DesignFile::Load(options_.designFile, *data_);
+    // The netlist of an earlier Finish is built anew by the next one.
+    for (const auto& b : data_->Blocks())
+        if (b->IsGenerated())
+            b->active = false;
+    return true;
+}
+
+bool Tsy_HostSession::makeWizard(std::string& error)
+{
+    std::string path = Tsy_PluginLoader::Locate(wizards_->PluginFile());
+    if (path.empty()) {
+        error = wizards_->PluginFile() + ": wizard plug-in not found";
+        return false;
+    }
+    static Tsy_PluginLoader loader;
+    if (!loader.IsLoaded() && !loader.Load(path, error))
+        return false;
+    wizard_ = loader.Create(wizardKey_, options_.batch);
+    if (!wizard_) {
+        error = "--wizard " + wizardKey_ + ": this wizard type is not available in this build";
+        return false;
+    }
+    Tsy_PartInfo part;
+    Tsy_DeviceCatalog::Instance().FindPart(part_, part);
+    Tsy_WizContext ctx = Tsy_ContextForPart(part);
+    ctx.moduleName = module_;
+    ctx.designVersion = loadedVersion_;
+    ctx.data = data_.get();
+    ctx.stream = &stream_;
+    ctx.loadedDesign = !options_.designFile.empty() || !options_.sets.empty() || !options_.pins.empty();
+    ctx.defaultSetup = !ctx.loadedDesign;
+    ctx.retarget = !options_.designFile.empty() && !loadedFamily_.empty() && loadedFamily_ != part.family->key;
+    wizard_->SetContext(ctx);
+    wizard_->SetBeforePagesHook([this] { return applySettings(); });
+    wizard_->SetOutputHooks([this](StringBase& why) {
+        std::string e;
+        bool ok = WriteOutputs(e);
+        why = e;
+        return ok;
+    },
+                            [this] {
+                                std::vector<StringBase> out;
+                                for (const auto& p : PlannedFiles())
+                                    out.push_back(p);
+                                return out;
+                            });
+    return true;
+}
+
+bool Tsy_HostSession::applySettings()
+{
+    auto fail = [this](const std::string& option, const std::string& text, const std::string& why) {
+        error_ = option + " " + text + ": " + why;
+        return false;
+    };
+    for (const auto& text : options_.sets) {
+        Tsy_Setting s;
+        Tsy_ParseSetting(text, false, s, error_);
+        StringBase reason;
+        Tsy_Block* block = wizard_->ResolveTarget(s.target, reason);
+        if (!block)
+            return fail("--set", text, reason.str());
+        if (s.pin.empty()) {
+            bool known = block->GetNamedAttribute(s.name) || (block->GetDef() && block->GetDef()->FindAttr(s.name));
+            if (!known)
+                return fail("--set", text, block->GetType().str() + " has no attribute " + s.name);
+            block->SetAttributeValue(s.name, s.value);
+            block->SetAttributeIsActive(s.name, true);
+        } else {
+            Tsy_Pin* pin = block->GetNamedPin(s.pin);
+            if (!pin)
+                return fail("--set", text, block->GetType().str() + " has no pin " + s.pin);
+            pin->SetAttributeValue(s.name, s.value);
+        }
+    }
+    for (const auto& text : options_.pins) {
+        Tsy_Setting s;
+        Tsy_ParseSetting(text, true, s, error_);
+        StringBase reason;
+        Tsy_Block* block = wizard_->ResolveTarget(s.target, reason);
+        if (!block)
+            return fail("--pin", text, reason.str());
+        Tsy_Pin* pin = block->GetNamedPin(s.pin);
+        if (!pin)
+            return fail("--pin", text, block->GetType().str() + " has no pin " + s.pin);
+        bool on = false;
+        parseOnOff(s.value, on);
+        pin->SetIsActive(on);
+    }
+    return true;
+}
+
+int Tsy_HostSession::Run()
+{
+    if (!wizard_)
+        return kUsage;
+    int rc = wizard_->Run();
+    if (rc == 2)
+        return kUsage;
+    return rc == 0 ? kOk : kFailed;
+}
+
+std::vector<std::string> Tsy_HostSession::PlannedFiles() const
+{
+    std::string dir = options_.outDir.empty() ? "." : options_.outDir;
+    return {dir + "/" + module_ + ".tsw"};
+}
+
+bool Tsy_HostSession::WriteOutputs(std::string& error)
+{
+    if (!makeDirectories(options_.outDir, error))
+        return false;
+    Tsy_DesignHeader header;
+    header.wizard = wizardKey_;
+    header.part = part_;
+    header.module = module_;
+    header.version = PENDRA_VERSION;
+    std::vector<std::string> paths = PlannedFiles();
+    Tsy_OutputSet files;
+    files.Add(paths[0], Tsy_DesignFile::ToText(header, *data_));
+    if (!files.Commit(error))
+        return false;
+    written_ = files.Paths();
+    return true;
+}
