@@ -54,16 +54,17 @@ Gq_Wizard::Gq_Wizard(QWidget* parent) : QDialog(parent)
         QKeySequence key;
         const char* tip;
     };
+    // The page forms carry their own Alt-letter accelerators (Alt+N, Alt+F
+    // and Alt+M among them), so the buttons every page shares keep to keys
+    // no form uses: Enter for Next (Finish on the last page), Esc for Cancel.
     const Spec specs[6] = {
-        {"ButtonMoreInfo", "&More Info", QKeySequence(Qt::ALT | Qt::Key_M), "Open the help page of this page (Alt+M)"},
+        {"ButtonMoreInfo", "More Info", QKeySequence(Qt::Key_F1), "Open the help page of this page (F1)"},
         {"ButtonAdvanced", "&Advanced...", QKeySequence(Qt::ALT | Qt::Key_A),
          "Open the advanced settings of this page (Alt+A)"},
-        {"ButtonBack", "< &Back", QKeySequence(Qt::ALT | Qt::Key_B), "Go back to the previous page (Alt+B)"},
-        {"ButtonNext", "&Next >", QKeySequence(Qt::ALT | Qt::Key_N), "Check this page and go on (Alt+N)"},
-        {"ButtonFinish", "&Finish", QKeySequence(Qt::ALT | Qt::Key_F),
-         "Generate the design and write its files (Alt+F)"},
-        {"ButtonCancel", "&Cancel", QKeySequence(Qt::ALT | Qt::Key_C),
-         "Close the wizard without writing anything (Esc)"},
+        {"ButtonBack", "< Back", QKeySequence(Qt::ALT | Qt::Key_Left), "Go back to the previous page (Alt+Left)"},
+        {"ButtonNext", "Next >", QKeySequence(Qt::ALT | Qt::Key_Right), "Check this page and go on (Enter, Alt+Right)"},
+        {"ButtonFinish", "Finish", QKeySequence(), "Generate the design and write its files (Enter on the last page)"},
+        {"ButtonCancel", "Cancel", QKeySequence(Qt::Key_Escape), "Close the wizard without writing anything (Esc)"},
     };
     for (int i = 0; i < 6; ++i) {
         auto* b = new QPushButton(this);
@@ -329,18 +330,18 @@ void Gq_Wizard::updateButtons()
 
     QPushButton* b = buttons_[Back];
     QString name = back >= 0 ? buttonName(back, -1) : QString();
-    b->setText(name.isEmpty() ? QString("< &Back") : "< " + literal(name));
-    b->setShortcut(QKeySequence(Qt::ALT | Qt::Key_B));
-    b->setToolTip(name.isEmpty() ? QString("Go back to the previous page (Alt+B)")
-                                 : QString("Go back to %1 (Alt+B)").arg(name));
+    b->setText(name.isEmpty() ? QString("< Back") : "< " + literal(name));
+    b->setShortcut(QKeySequence(Qt::ALT | Qt::Key_Left));
+    b->setToolTip(name.isEmpty() ? QString("Go back to the previous page (Alt+Left)")
+                                 : QString("Go back to %1 (Alt+Left)").arg(name));
     b->setEnabled(back >= 0);
 
     QPushButton* n = buttons_[Next];
     name = next >= 0 ? buttonName(next, +1) : (currentPage() ? currentPage()->pageNextName() : QString());
-    n->setText(name.isEmpty() ? QString("&Next >") : literal(name) + " >");
-    n->setShortcut(QKeySequence(Qt::ALT | Qt::Key_N));
-    n->setToolTip(name.isEmpty() ? QString("Check this page and go on (Alt+N)")
-                                 : QString("Check this page and go on to %1 (Alt+N)").arg(name));
+    n->setText(name.isEmpty() ? QString("Next >") : literal(name) + " >");
+    n->setShortcut(QKeySequence(Qt::ALT | Qt::Key_Right));
+    n->setToolTip(name.isEmpty() ? QString("Check this page and go on (Enter, Alt+Right)")
+                                 : QString("Check this page and go on to %1 (Enter, Alt+Right)").arg(name));
     n->setEnabled(next >= 0);
 
     buttons_[Finish]->setEnabled(last);

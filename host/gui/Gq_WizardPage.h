@@ -5,9 +5,9 @@
 #include <QObject>
 #include <QPointer>
 #include <QString>
+#include <QWidget>
 
 class Gq_Wizard;
-class QWidget;
 
 class Gq_WizardPage : public QObject {
     Q_OBJECT
