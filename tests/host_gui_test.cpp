@@ -1043,7 +1043,9 @@ TEST_F(StartDialogTest, BrowseFillsInTheChosenFolder)
         [&](QWidget* modal) {
             auto* files = qobject_cast<QFileDialog*>(modal);
             ASSERT_NE(files, nullptr);
-            files->selectFile(chosen.path());
+            // Entering the folder and accepting chooses it; selecting its
+            // name in the parent would race the dialog's file listing.
+            files->setDirectory(chosen.path());
             QMetaObject::invokeMethod(files, "accept");
         });
     EXPECT_EQ(QFileInfo(dialog_->outputFolder()).canonicalFilePath(), QFileInfo(chosen.path()).canonicalFilePath());

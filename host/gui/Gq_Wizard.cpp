@@ -64,7 +64,8 @@ Gq_Wizard::Gq_Wizard(QWidget* parent) : QDialog(parent)
         {"ButtonBack", "< Back", QKeySequence(Qt::ALT | Qt::Key_Left), "Go back to the previous page (Alt+Left)"},
         {"ButtonNext", "Next >", QKeySequence(Qt::ALT | Qt::Key_Right), "Check this page and go on (Enter, Alt+Right)"},
         {"ButtonFinish", "Finish", QKeySequence(), "Generate the design and write its files (Enter on the last page)"},
-        {"ButtonCancel", "Cancel", QKeySequence(Qt::Key_Escape), "Close the wizard without writing anything (Esc)"},
+        // Esc is the dialog's own: it rejects at once, like the button.
+        {"ButtonCancel", "Cancel", QKeySequence(), "Close the wizard without writing anything (Esc)"},
     };
     for (int i = 0; i < 6; ++i) {
         auto* b = new QPushButton(this);
