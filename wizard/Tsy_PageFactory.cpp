@@ -4,11 +4,14 @@
 
 #include "wizard/Tsy_PageSets.h"
 
+#include "pages/dcm/Tsy_DCMgenSetup.h"
+#include "wizard/Tsy_DCMwiz.h"
+
 Tsy_DCMwizPage* Tsy_CreatePage(Tsy_PageKind kind, Tsy_DCMwiz* wizard, int instance)
 {
-    (void)wizard;
-    (void)instance;
     switch (kind) {
+    case Tsy_PageKind::GeneralSetup:
+        return new Tsy_DCMgenSetup(wizard, wizard ? wizard->GetWizTypeInt() : 0, instance);
     default:
         return nullptr;
     }
