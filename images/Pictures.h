@@ -20,3 +20,5 @@ struct PictureSpec {
 
 // Each source file of pictures adds its own.
 void addTextPictures(std::vector<PictureSpec>& out);
+// The buffer symbols of the View/Edit Buffer dialog.
+void addBufferPictures(std::vector<PictureSpec>& out);

@@ -4,6 +4,7 @@
 
 #include "wizard/Tsy_PageSets.h"
 
+#include "pages/dcm/Tsy_ClockBufDlg.h"
 #include "pages/dcm/Tsy_DCMgenSetup.h"
 #include "wizard/Tsy_DCMwiz.h"
 
@@ -12,6 +13,8 @@ Tsy_DCMwizPage* Tsy_CreatePage(Tsy_PageKind kind, Tsy_DCMwiz* wizard, int instan
     switch (kind) {
     case Tsy_PageKind::GeneralSetup:
         return new Tsy_DCMgenSetup(wizard, wizard ? wizard->GetWizTypeInt() : 0, instance);
+    case Tsy_PageKind::ClockBuffers:
+        return new Tsy_ClockBufDlg(wizard, instance);
     default:
         return nullptr;
     }
