@@ -6,6 +6,7 @@
 
 #include "pages/dcm/Tsy_ClockBufDlg.h"
 #include "pages/dcm/Tsy_DCMgenSetup.h"
+#include "pages/dcm/Tsy_JitterDlg.h"
 #include "wizard/Tsy_DCMwiz.h"
 
 Tsy_DCMwizPage* Tsy_CreatePage(Tsy_PageKind kind, Tsy_DCMwiz* wizard, int instance)
@@ -15,6 +16,8 @@ Tsy_DCMwizPage* Tsy_CreatePage(Tsy_PageKind kind, Tsy_DCMwiz* wizard, int instan
         return new Tsy_DCMgenSetup(wizard, wizard ? wizard->GetWizTypeInt() : 0, instance);
     case Tsy_PageKind::ClockBuffers:
         return new Tsy_ClockBufDlg(wizard, instance);
+    case Tsy_PageKind::ClockFrequencySynthesizer:
+        return new Tsy_JitterDlg(wizard, instance);
     default:
         return nullptr;
     }

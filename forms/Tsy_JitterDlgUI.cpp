@@ -1,0 +1,6 @@
+#include "Tsy_JitterDlgUI.h"
+
+Tsy_JitterDlgUI::Tsy_JitterDlgUI(QWidget* parent) : QWidget(parent)
+{
+    setupUi(this);
+}

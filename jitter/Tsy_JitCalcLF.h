@@ -1,0 +1,11 @@
+#pragma once
+// Jitter of the synthesizer running in its low-frequency mode.
+
+#include "jitter/Tsy_JitCalc.h"
+
+class Tsy_JitCalcLF : public Tsy_JitCalc {
+public:
+    using Tsy_JitCalc::Tsy_JitCalc;
+    bool CalculateJitter(Tsy_SpeedData* speed, float fin, float fout, int m, int d, float& r1, float& r2, float& r3,
+                         float& r4) const override;
+};
