@@ -362,6 +362,8 @@ def check_primitives(doc):
                 fail(aw + ": unknown type '%s'" % type_)
             if (n.startswith("TESY_ONLY_") or n.startswith("TSY_")) and type_ != "string":
                 fail(aw + ": a wizard attribute is a string")
+            if (n.startswith("TESY_ONLY_") or n.startswith("TSY_")) and ad.get("hdl", True) is not False:
+                fail(aw + ": a wizard attribute never reaches the HDL (\"hdl\": false)")
             default = ad.get("default", "")
             if not isinstance(default, str):
                 fail(aw + ": 'default' must be a string")
@@ -370,7 +372,7 @@ def check_primitives(doc):
             if not is_str_list(values):
                 fail(aw + ": 'values' must be a list of strings")
                 values = []
-            for key in ("active", "template"):
+            for key in ("active", "template", "hdl"):
                 if not isinstance(ad.get(key, True), bool):
                     fail(aw + ": '%s' must be true or false" % key)
             check_value_type(aw + " default", type_, default)

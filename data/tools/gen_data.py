@@ -51,6 +51,15 @@ def attr(name, type_="string", default="", values=None, range_=None, template=Tr
     return a
 
 
+def wizard_only(attrs):
+    """Marks attributes as the wizard's own: page settings that are no property
+    of the primitive, so the HDL writers leave them out (some, such as
+    FIN_UNITS or USE_BUFG, carry no TESY_ONLY_/TSY_ prefix that would say so)."""
+    for a in attrs:
+        a["hdl"] = False
+    return attrs
+
+
 def simple(type_, description, ins, outs, attributes=()):
     """A primitive all of whose pins are in use whenever it is placed."""
     pins = [pin(n, "IN", active=True) for n in ins] + [pin(n, "OUT", active=True) for n in outs]
@@ -180,7 +189,7 @@ def dcm_wizard_attributes(generation45):
             attr("TSY_PLL2DCM_CLKOUT", default="CLKOUTDCM0", values=["CLKOUTDCM%d" % n for n in range(6)]),
         ]
     attrs += [attr("USE_BUFG", default="USE_BUFGS", values=["USE_BUFGS", "USE_GRID"])]
-    return attrs
+    return wizard_only(attrs)
 
 
 def dcm_primitives():
@@ -244,7 +253,7 @@ def pll_attributes(adv):
     ]
     if not adv:
         return attrs
-    attrs += [
+    attrs += wizard_only([
         attr("TESY_ONLY_CLKSEL", default="1", values=["1", "0", "signal"]),
         attr("TESY_ONLY_CLKIN1_VALUE", default="100"),
         attr("TESY_ONLY_CLKIN2_VALUE", default="100"),
@@ -265,12 +274,12 @@ def pll_attributes(adv):
         attr("TSY_CLKIN2_INPUT_BUFFER", default="SINGLE", values=["SINGLE", "DIFFERENTIAL"]),
         # Carries the range of the output divider spin boxes.
         attr("TSY_CLKOUT_DIVIDE_DEFAULT", default="8", range_=[1, 128]),
-    ]
+    ])
     for n in range(6):
-        attrs += [attr("TSY_PLL_EST_JITTER_CLKOUT%d" % n, template=False)]
+        attrs += wizard_only([attr("TSY_PLL_EST_JITTER_CLKOUT%d" % n, template=False)])
     for n in range(6):
-        attrs += [attr("TSY_PLL_EST_JITTER_CLKOUTDCM%d" % n, template=False)]
-    attrs += [attr("USE_BUFG", default="USE_BUFGS", values=["USE_BUFGS", "USE_GRID"])]
+        attrs += wizard_only([attr("TSY_PLL_EST_JITTER_CLKOUTDCM%d" % n, template=False)])
+    attrs += wizard_only([attr("USE_BUFG", default="USE_BUFGS", values=["USE_BUFGS", "USE_GRID"])])
     return attrs
 
 
@@ -303,6 +312,7 @@ def pmcd_primitive():
     attrs = [
         attr("EN_REL", "string", "FALSE", FALSE_TRUE),
         attr("RST_DEASSERT_CLK", "string", "CLKA", ["CLKA", "CLKB", "CLKC", "CLKD"]),
+    ] + wizard_only([
         attr("TESY_ONLY_INST_NUM", values=["1", "2"], template=False),
         attr("TESY_ONLY_PMCD_CONFIG", default="SINGLE", values=["SINGLE", "PARALLEL"]),
         attr("TESY_ONLY_PMCD_CLKA", default="CLK0", values=DCM_CLOCKS),
@@ -311,7 +321,7 @@ def pmcd_primitive():
         attr("TESY_ONLY_PMCD_CLKD", default="", values=DCM_CLOCKS),
         attr("TESY_ONLY_PMCD_FB", default="CLKA1", values=["CLKA1", "CLKB1", "CLKC1", "CLKD1"]),
         attr("USE_BUFG", default="USE_BUFGS", values=["USE_BUFGS", "USE_GRID"]),
-    ]
+    ])
     return {"type": "PMCD",
             "description": "Phase-matched clock divider: four phase-aligned inputs, CLKA divided by 1, 2, 4 and 8",
             "pins": ins + outs, "attributes": attrs}

@@ -58,6 +58,7 @@ Tsy_AttrDef readAttr(const Tsy_JsonReader& r)
     }
     attr.startsActive = r.OptionalBool("active", true);
     attr.onTemplate = r.OptionalBool("template", true);
+    attr.hdl = r.OptionalBool("hdl", true);
     return attr;
 }
 

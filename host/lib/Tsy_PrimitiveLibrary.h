@@ -21,6 +21,9 @@ struct Tsy_AttrDef {
     bool startsActive = true;
     // Whether a new template block carries the attribute from the start.
     bool onTemplate = true;
+    // False for the wizard's own settings kept on a block: they are no
+    // property of the primitive and never reach the HDL.
+    bool hdl = true;
 };
 
 struct Tsy_PinDef {

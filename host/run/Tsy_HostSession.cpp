@@ -4,6 +4,7 @@
 #include "design/Tsy_DesignFile.h"
 #include "design/Tsy_OutputSet.h"
 #include "hdl/Tsy_HdlNames.h"
+#include "hdl/Tsy_HdlWriter.h"
 #include "lib/Tsy_DataDir.h"
 #include "lib/Tsy_DeviceCatalog.h"
 #include "lib/Tsy_PrimitiveLibrary.h"
@@ -327,8 +328,8 @@ int Tsy_HostSession::Run()
 
 std::vector<std::string> Tsy_HostSession::PlannedFiles() const
 {
-    std::string dir = options_.outDir.empty() ? "." : options_.outDir;
-    return {dir + "/" + module_ + ".tsw"};
+    std::string base = (options_.outDir.empty() ? "." : options_.outDir) + "/" + module_;
+    return {base + ".tsw", base + ".v", base + ".vhd", base + "_inst.vt", base + "_inst.vht"};
 }
 
 bool Tsy_HostSession::WriteOutputs(std::string& error)
@@ -341,8 +342,21 @@ bool Tsy_HostSession::WriteOutputs(std::string& error)
     header.module = module_;
     header.version = PENDRA_VERSION;
     std::vector<std::string> paths = PlannedFiles();
+    // The HDL is made first: a netlist it refuses leaves every file as it was.
+    std::vector<std::string> banner = {
+        module_ + ": clock network for part " + part_ + ", made by the '" + wizardKey_ + "' wizard of pendra " +
+            PENDRA_VERSION + ".",
+        "The design is kept in " + module_ + ".tsw: change it there and generate again rather than",
+        "editing this file."};
+    Tsy_HdlFiles hdl;
+    if (!Tsy_WriteHdl(*data_, module_, banner, hdl, error))
+        return false;
     Tsy_OutputSet files;
     files.Add(paths[0], Tsy_DesignFile::ToText(header, *data_));
+    files.Add(paths[1], hdl.verilog);
+    files.Add(paths[2], hdl.vhdl);
+    files.Add(paths[3], hdl.verilogTemplate);
+    files.Add(paths[4], hdl.vhdlTemplate);
     if (!files.Commit(error))
         return false;
     written_ = files.Paths();
