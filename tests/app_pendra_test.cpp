@@ -85,6 +85,7 @@ TEST(Pendra, RefusesBadOptionsWithOneLineAndExitTwo)
         {"generate --wizard dcm --part t5da1-1 --module 2fast", "--module 2fast"},
         {"generate --wizard dcm --part t5da1-1 --module entity", "VHDL keyword"},
         {"generate --wizard dcm --part t5da1-1 --module a-b", "--module a-b"},
+        {"generate --wizard dcm --part t5da1-1 --module bufg", "the name of a library primitive"},
         {"generate --wizard dcm", "both --wizard and --part"},
         {"generate " + dir.File("missing.tsw"), "missing.tsw"},
         {"generate " + dir.File("broken.tsw"), "broken.tsw: line 2, column"},

@@ -195,6 +195,13 @@ bool Tsy_HostSession::checkOptions(const Tsy_RunOptions& o, std::string& error)
         error = "--module " + module_ + ": not a legal Verilog and VHDL name: it " + problem;
         return false;
     }
+    // The module would clash with the primitives it instantiates (VHDL
+    // names ignore case).
+    for (const auto& type : Tsy_PrimitiveLibrary::Instance().Types())
+        if (StringBase(type).EqualsNoCase(module_)) {
+            error = "--module " + module_ + ": the name of a library primitive; choose another module name";
+            return false;
+        }
     Tsy_Setting s;
     for (const auto& text : o.sets)
         if (!Tsy_ParseSetting(text, false, s, error)) {
