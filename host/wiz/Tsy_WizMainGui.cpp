@@ -3,6 +3,7 @@
 #include "wiz/Tsy_WizMain.h"
 
 #include "db/Tsy_WizData.h"
+#include "lib/Tsy_PrimitiveLibrary.h"
 #include "gui/Gq_SummaryPage.h"
 #include "gui/Gq_Wizard.h"
 #include "wiz/Tsy_WizPage.h"
@@ -16,9 +17,11 @@ QString escaped(const StringBase& s)
     return QString::fromStdString(s.str()).toHtmlEscaped();
 }
 
-bool isWizardPrivate(const StringBase& name)
+// The wizard's own settings kept on a block are no property of the design.
+bool isWizardPrivate(const Tsy_Attribute& a)
 {
-    return name.StartsWith("TESY_ONLY_") || name.StartsWith("TSY_");
+    const StringBase& name = a.GetName();
+    return name.StartsWith("TESY_ONLY_") || name.StartsWith("TSY_") || (a.GetDef() && !a.GetDef()->hdl);
 }
 
 // The primitive properties of every active block: what the HDL will carry.
@@ -33,7 +36,7 @@ QString describeBlocks(const Tsy_WizData* data)
         html += QString("<h3>%1 <small>(%2)</small></h3><table>")
                     .arg(escaped(block->GetName()), escaped(block->GetType()));
         for (const auto& a : block->Attributes())
-            if (a->IsActive() && !isWizardPrivate(a->GetName()))
+            if (a->IsActive() && !isWizardPrivate(*a))
                 html += QString("<tr><td>%1</td><td>&nbsp;%2</td></tr>").arg(escaped(a->GetName()), escaped(a->GetValue()));
         QStringList pins;
         for (const auto& p : block->Pins())
