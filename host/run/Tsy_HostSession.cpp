@@ -280,46 +280,47 @@ bool Tsy_HostSession::makeWizard(std::string& error)
     return true;
 }
 
-bool Tsy_HostSession::applySettings()
+bool Tsy_HostSession::applySetting(const std::string& text, bool pinSetting)
 {
-    auto fail = [this](const std::string& option, const std::string& text, const std::string& why) {
+    const std::string option = pinSetting ? "--pin" : "--set";
+    auto fail = [&](const std::string& why) {
         error_ = option + " " + text + ": " + why;
         return false;
     };
-    for (const auto& text : options_.sets) {
-        Tsy_Setting s;
-        Tsy_ParseSetting(text, false, s, error_);
-        StringBase reason;
-        Tsy_Block* block = wizard_->ResolveTarget(s.target, reason);
-        if (!block)
-            return fail("--set", text, reason.str());
-        if (s.pin.empty()) {
-            bool known = block->GetNamedAttribute(s.name) || (block->GetDef() && block->GetDef()->FindAttr(s.name));
-            if (!known)
-                return fail("--set", text, block->GetType().str() + " has no attribute " + s.name);
-            block->SetAttributeValue(s.name, s.value);
-            block->SetAttributeIsActive(s.name, true);
-        } else {
-            Tsy_Pin* pin = block->GetNamedPin(s.pin);
-            if (!pin)
-                return fail("--set", text, block->GetType().str() + " has no pin " + s.pin);
-            pin->SetAttributeValue(s.name, s.value);
-        }
-    }
-    for (const auto& text : options_.pins) {
-        Tsy_Setting s;
-        Tsy_ParseSetting(text, true, s, error_);
-        StringBase reason;
-        Tsy_Block* block = wizard_->ResolveTarget(s.target, reason);
-        if (!block)
-            return fail("--pin", text, reason.str());
-        Tsy_Pin* pin = block->GetNamedPin(s.pin);
-        if (!pin)
-            return fail("--pin", text, block->GetType().str() + " has no pin " + s.pin);
+    Tsy_Setting s;
+    Tsy_ParseSetting(text, pinSetting, s, error_);
+    StringBase reason;
+    Tsy_Block* block = wizard_->ResolveTarget(s.target, reason);
+    if (!block)
+        return fail(reason.str());
+    Tsy_Pin* pin = s.pin.empty() ? nullptr : block->GetNamedPin(s.pin);
+    if (!s.pin.empty() && !pin)
+        return fail(block->GetType().str() + " has no pin " + s.pin);
+    if (pinSetting) {
         bool on = false;
         parseOnOff(s.value, on);
         pin->SetIsActive(on);
+    } else if (pin) {
+        pin->SetAttributeValue(s.name, s.value);
+    } else {
+        // Block attributes must be ones the primitive knows: a typo would
+        // otherwise be stored silently and change nothing.
+        if (!block->GetNamedAttribute(s.name) && !(block->GetDef() && block->GetDef()->FindAttr(s.name)))
+            return fail(block->GetType().str() + " has no attribute " + s.name);
+        block->SetAttributeValue(s.name, s.value);
+        block->SetAttributeIsActive(s.name, true);
     }
+    return true;
+}
+
+bool Tsy_HostSession::applySettings()
+{
+    for (const auto& text : options_.sets)
+        if (!applySetting(text, false))
+            return false;
+    for (const auto& text : options_.pins)
+        if (!applySetting(text, true))
+            return false;
     return true;
 }
 

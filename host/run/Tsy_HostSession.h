@@ -55,6 +55,7 @@ private:
     bool makeDatabase(std::string& error);
     bool makeWizard(std::string& error);
     bool applySettings();
+    bool applySetting(const std::string& text, bool pinSetting);
 
     Port::Stream& stream_;
     Tsy_RunOptions options_;
