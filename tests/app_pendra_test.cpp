@@ -1,7 +1,7 @@
 // The pendra program as a user runs it: listings, exit codes and the one-line
 // errors of bad options and bad design files, and what a batch run writes.
 
-#include "support/TestDesign.h"
+#include "support/BatchRun.h"
 
 #include <gtest/gtest.h>
 
@@ -9,14 +9,9 @@
 
 namespace {
 
-std::string pendra()
-{
-    return std::string(PENDRA_BIN_DIR) + "/pendra";
-}
-
 CommandResult run(const std::string& args)
 {
-    return RunCommand(pendra() + " " + args);
+    return RunCommand(PendraProgram() + " " + args);
 }
 
 int lines(const std::string& text)
@@ -101,7 +96,7 @@ TEST(Pendra, RefusesBadOptionsWithOneLineAndExitTwo)
         {"", "subcommand"},
     };
     for (const auto& c : cases) {
-        CommandResult r = RunCommand("cd '" + dir.Path() + "' && " + pendra() + " " + c.args);
+        CommandResult r = RunCommand("cd '" + dir.Path() + "' && " + PendraProgram() + " " + c.args);
         EXPECT_EQ(r.status, 2) << c.args << "\n" << r.err;
         EXPECT_EQ(lines(r.err), 1) << c.args << "\n" << r.err;
         EXPECT_NE(r.err.find(c.expected), std::string::npos) << c.args << "\n" << r.err;

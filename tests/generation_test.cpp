@@ -5,9 +5,9 @@
 #include "design/Tsy_DesignFile.h"
 #include "hdl/Tsy_HdlWriter.h"
 #include "run/Tsy_HostSession.h"
+#include "support/BatchRun.h"
 #include "support/DcmDesigns.h"
 #include "support/NetlistView.h"
-#include "support/TestDesign.h"
 
 #include <gtest/gtest.h>
 
@@ -184,50 +184,46 @@ const DcmDesign& designNamed(const std::string& name)
     throw std::runtime_error("no design " + name);
 }
 
-// External single-ended input, internal 1X feedback, CLK0 on a global buffer:
-// the whole netlist, with the feedback clock mirrored on CLK0_OUT.
-TEST(DcmGeneration, SingleDcmWithInternalFeedbackIsTheWholeNetlist)
+// Two designs read whole: external single-ended input, internal 1X feedback
+// and CLK0 on a global buffer, the feedback clock mirrored on CLK0_OUT; and
+// the same in board deskew, U1_ on the first DCM's names, U2_ on the
+// second's, the second DCM taking the first one's buffered input clock.
+TEST(DcmGeneration, TheWholeNetlistOfASingleDcmAndOfBoardDeskew)
 {
-    Built b(designNamed("single_default"));
-    ASSERT_EQ(b.result, 0);
-    NetlistView v(b.d.Data());
-    EXPECT_EQ(v.Blocks(), (std::vector<std::string>{"CLK0_BUFG_INST:BUFG", "CLKIN_IBUFG_INST:IBUFG",
-                                                     "DCM_ADV_INST:DCM_ADV"}));
-    EXPECT_EQ(v.Ports(), (std::vector<std::string>{"CLK0_OUT:out", "CLKIN_IBUFG_OUT:out", "CLKIN_IN:in",
-                                                    "LOCKED_OUT:out", "RST_IN:in"}));
-    expectNetlist(v,
-                  {"CLKIN_IBUFG_INST.I=CLKIN_IN", "CLKIN_IBUFG_INST.O=CLKIN_IBUFG", "CLKIN_IBUFG is net",
-                   "DCM_ADV_INST.CLKIN=CLKIN_IBUFG", "CLKIN_IBUFG[ASSOC_WITH]=CLKIN_IBUFG_OUT",
-                   "CLK0_BUFG_INST.I=CLK0_BUF", "DCM_ADV_INST.CLK0=CLK0_BUF", "CLK0_BUF is net",
-                   "CLK0_BUFG_INST.O=CLKFB_IN", "CLKFB_IN is net", "DCM_ADV_INST.CLKFB=CLKFB_IN",
-                   "CLKFB_IN[ASSOC_WITH]=CLK0_OUT", "DCM_ADV_INST.LOCKED=LOCKED_OUT", "DCM_ADV_INST.RST=RST_IN",
-                   "DCM_ADV_INST.CLK90=(inactive)", "DCM_ADV_INST.PSEN=(inactive)"},
-                  "single_default");
-}
-
-// The same design in board deskew: U1_ on the first DCM's names, U2_ on the
-// second's; the second DCM takes the first one's buffered input clock.
-TEST(DcmGeneration, BoardDeskewPrefixesEachDcmsNames)
-{
-    Built b(designNamed("board_deskew_internal_feedback"));
-    ASSERT_EQ(b.result, 0);
-    NetlistView v(b.d.Data());
-    EXPECT_EQ(v.Blocks(),
-              (std::vector<std::string>{"DCM_ADV_INST1:DCM_ADV", "DCM_ADV_INST2:DCM_ADV", "U1_CLK0_BUFG_INST:BUFG",
-                                        "U1_CLK0_OBUF_INST:OBUF", "U1_CLKIN_IBUFG_INST:IBUFG", "U2_CLK0_BUFG_INST:BUFG"}));
-    EXPECT_EQ(v.Ports(), (std::vector<std::string>{"U1_CLK0_OUT1:out", "U1_CLK0_OUT:out", "U1_CLKIN_IBUFG_OUT:out",
-                                                    "U1_CLKIN_IN:in", "U1_LOCKED_OUT:out", "U1_RST_IN:in",
-                                                    "U2_CLK0_OUT:out", "U2_LOCKED_OUT:out", "U2_RST_IN:in"}));
-    expectNetlist(v,
-                  {"U1_CLKIN_IBUFG_INST.I=U1_CLKIN_IN", "U1_CLKIN_IBUFG_INST.O=U1_CLKIN_IBUFG",
-                   "DCM_ADV_INST1.CLKIN=U1_CLKIN_IBUFG", "U1_CLKIN_IBUFG[ASSOC_WITH]=U1_CLKIN_IBUFG_OUT",
-                   "U1_CLK0_BUFG_INST.I=U1_CLK0_BUF", "U1_CLK0_BUFG_INST.O=U1_CLKFB_IN", "DCM_ADV_INST1.CLKFB=U1_CLKFB_IN",
-                   "U1_CLKFB_IN[ASSOC_WITH]=U1_CLK0_OUT", "U1_CLK0_OBUF_INST.I=U1_CLK0_BUF",
-                   "U1_CLK0_OBUF_INST.O=U1_CLK0_OUT1", "DCM_ADV_INST1.LOCKED=U1_LOCKED_OUT",
-                   "DCM_ADV_INST2.CLKIN=U1_CLKIN_IBUFG", "U2_CLK0_BUFG_INST.I=U2_CLK0_BUF",
-                   "U2_CLK0_BUFG_INST.O=U2_CLKFB_IN", "DCM_ADV_INST2.CLKFB=U2_CLKFB_IN",
-                   "U2_CLKFB_IN[ASSOC_WITH]=U2_CLK0_OUT", "DCM_ADV_INST2.LOCKED=U2_LOCKED_OUT"},
-                  "board_deskew_internal_feedback");
+    struct Case {
+        const char* design;
+        std::vector<std::string> blocks, ports, lines;
+    } cases[] = {
+        {"single_default",
+         {"CLK0_BUFG_INST:BUFG", "CLKIN_IBUFG_INST:IBUFG", "DCM_ADV_INST:DCM_ADV"},
+         {"CLK0_OUT:out", "CLKIN_IBUFG_OUT:out", "CLKIN_IN:in", "LOCKED_OUT:out", "RST_IN:in"},
+         {"CLKIN_IBUFG_INST.I=CLKIN_IN", "CLKIN_IBUFG_INST.O=CLKIN_IBUFG", "CLKIN_IBUFG is net",
+          "DCM_ADV_INST.CLKIN=CLKIN_IBUFG", "CLKIN_IBUFG[ASSOC_WITH]=CLKIN_IBUFG_OUT", "CLK0_BUFG_INST.I=CLK0_BUF",
+          "DCM_ADV_INST.CLK0=CLK0_BUF", "CLK0_BUF is net", "CLK0_BUFG_INST.O=CLKFB_IN", "CLKFB_IN is net",
+          "DCM_ADV_INST.CLKFB=CLKFB_IN", "CLKFB_IN[ASSOC_WITH]=CLK0_OUT", "DCM_ADV_INST.LOCKED=LOCKED_OUT",
+          "DCM_ADV_INST.RST=RST_IN", "DCM_ADV_INST.CLK90=(inactive)", "DCM_ADV_INST.PSEN=(inactive)"}},
+        {"board_deskew_internal_feedback",
+         {"DCM_ADV_INST1:DCM_ADV", "DCM_ADV_INST2:DCM_ADV", "U1_CLK0_BUFG_INST:BUFG", "U1_CLK0_OBUF_INST:OBUF",
+          "U1_CLKIN_IBUFG_INST:IBUFG", "U2_CLK0_BUFG_INST:BUFG"},
+         {"U1_CLK0_OUT1:out", "U1_CLK0_OUT:out", "U1_CLKIN_IBUFG_OUT:out", "U1_CLKIN_IN:in", "U1_LOCKED_OUT:out",
+          "U1_RST_IN:in", "U2_CLK0_OUT:out", "U2_LOCKED_OUT:out", "U2_RST_IN:in"},
+         {"U1_CLKIN_IBUFG_INST.I=U1_CLKIN_IN", "U1_CLKIN_IBUFG_INST.O=U1_CLKIN_IBUFG",
+          "DCM_ADV_INST1.CLKIN=U1_CLKIN_IBUFG", "U1_CLKIN_IBUFG[ASSOC_WITH]=U1_CLKIN_IBUFG_OUT",
+          "U1_CLK0_BUFG_INST.I=U1_CLK0_BUF", "U1_CLK0_BUFG_INST.O=U1_CLKFB_IN", "DCM_ADV_INST1.CLKFB=U1_CLKFB_IN",
+          "U1_CLKFB_IN[ASSOC_WITH]=U1_CLK0_OUT", "U1_CLK0_OBUF_INST.I=U1_CLK0_BUF", "U1_CLK0_OBUF_INST.O=U1_CLK0_OUT1",
+          "DCM_ADV_INST1.LOCKED=U1_LOCKED_OUT", "DCM_ADV_INST2.CLKIN=U1_CLKIN_IBUFG", "U2_CLK0_BUFG_INST.I=U2_CLK0_BUF",
+          "U2_CLK0_BUFG_INST.O=U2_CLKFB_IN", "DCM_ADV_INST2.CLKFB=U2_CLKFB_IN", "U2_CLKFB_IN[ASSOC_WITH]=U2_CLK0_OUT",
+          "DCM_ADV_INST2.LOCKED=U2_LOCKED_OUT"}},
+    };
+    for (const auto& c : cases) {
+        SCOPED_TRACE(c.design);
+        Built b(designNamed(c.design));
+        ASSERT_EQ(b.result, 0);
+        NetlistView v(b.d.Data());
+        EXPECT_EQ(v.Blocks(), c.blocks);
+        EXPECT_EQ(v.Ports(), c.ports);
+        expectNetlist(v, c.lines, c.design);
+    }
 }
 
 // A second Finish (after a refused one, say) builds the netlist anew rather
@@ -277,86 +273,50 @@ TEST(DcmGeneration, MissingDcmFailsTheFinish)
 }
 
 // What the designer typed or a design file holds, and Finish cannot build:
-// refused with a message naming it.
+// refused with a message naming it. PMCD designs hand the PMCD outputs'
+// buffers to the pages that configure them; what generation itself builds
+// around the PMCD is already there.
 TEST(DcmGeneration, RefusesWhatItCannotBuild)
 {
     struct Case {
-        const char* what;
-        std::function<void(Tsy_Block*)> setup;
+        const char* recipe;
         std::string message;
-    };
-    const std::vector<Case> cases = {
-        {"output name beginning with a digit",
-         [](Tsy_Block* b) {
-             Buffer(b, "CLK90", 1, "BUFG");
-             PinAttr(b, "CLK90", "TSY_CLKBUF1_O_SIGNAME", "2x_clk");
-         },
+        std::vector<std::string> built = {}; // what stands of the netlist
+    } cases[] = {
+        {"CLK90#1=BUFG; CLK90.TSY_CLKBUF1_O_SIGNAME=2x_clk",
          "The signal name '2x_clk' given to O of buffer 1 on CLK90 is not a legal Verilog and VHDL name: it must "
          "begin with a letter.  Please change it on the Clock Buffers page."},
-        {"enable name that is a keyword",
-         [](Tsy_Block* b) {
-             Buffer(b, "CLK90", 1, "BUFGCE");
-             PinAttr(b, "CLK90", "TSY_CLKBUF1_CE_SIGNAME", "signal");
-         },
+        {"CLK90#1=BUFGCE; CLK90.TSY_CLKBUF1_CE_SIGNAME=signal",
          "The signal name 'signal' given to CE of buffer 1 on CLK90 is not a legal Verilog and VHDL name: it is a "
          "VHDL keyword.  Please change it on the Clock Buffers page."},
-        {"unknown buffer type",
-         [](Tsy_Block* b) { Buffer(b, "CLKFX", 1, "BUFGX"); },
-         "The buffer type 'BUFGX' recorded for buffer 1 on CLKFX is not one the wizard can build."},
-        {"clock multiplexer without its second input",
-         [](Tsy_Block* b) { Buffer(b, "CLK90", 1, "BUFGMUX"); },
-         "The clock multiplexer of buffer 1 on CLK90 has no input I1."},
-        {"clock multiplexer fed from a pin that is no output",
-         [](Tsy_Block* b) {
-             Buffer(b, "CLK90", 1, "BUFGMUX");
-             PinAttr(b, "CLK90", "TSY_CLKBUF1_I1_PINNAME", "PSEN");
-         },
+        {"CLKFX#1=BUFGX", "The buffer type 'BUFGX' recorded for buffer 1 on CLKFX is not one the wizard can build."},
+        {"CLK90#1=BUFGMUX", "The clock multiplexer of buffer 1 on CLK90 has no input I1."},
+        {"CLK90#1=BUFGMUX; CLK90.TSY_CLKBUF1_I1_PINNAME=PSEN",
          "The clock multiplexer of buffer 1 on CLK90 takes its input I1 from 'PSEN', which is not an output of "
          "DCM_ADV_INST."},
+        {"TESY_ONLY_PMCD=SINGLE; FB_SOURCE=EXTERNAL", "",
+         {"PMCD_INST.REL=GND", "DCM_ADV_INST.CLK0=CLK0_OUT", "CLK0_OUT[USELOCALROUTING]=TRUE",
+          "DCM_ADV_INST.CLKFB=CLKFB_IBUFG", "CLK0_BUFG_INST:"}},
+        // The PMCDs need LOCKED all the same.
+        {"TESY_ONLY_PMCD=PARALLEL; -LOCKED; +CLK90", "",
+         {"PMCD_INST1.REL=LOCKED_OUT", "PMCD_INST2.REL=LOCKED_OUT", "DCM_ADV_INST.LOCKED=LOCKED_OUT",
+          "LOCKED_OUT is out", "DCM_ADV_INST.CLK90=CLK90_OUT", "CLK90_OUT[USELOCALROUTING]=TRUE"}},
     };
     for (const auto& c : cases) {
-        SCOPED_TRACE(c.what);
+        SCOPED_TRACE(c.recipe);
         TestDesign d("dcm", "t5da1-1");
         d.MarkLoaded();
         d.Instantiate();
-        c.setup(d.Wizard().GetActiveDCMBlk(1, true));
+        ApplyRecipe(d.Wizard(), c.recipe);
         EXPECT_EQ(d.Wizard().Finish(), -1);
-        EXPECT_EQ(d.Stream().Errors(), std::vector<StringBase>{c.message});
-    }
-}
-
-// PMCD designs hand the PMCD outputs' buffers to the pages that configure
-// them; what generation itself builds around the PMCD is already there.
-TEST(DcmGeneration, PmcdDesignsWireTheDcmSideAndSayWhatIsMissing)
-{
-    struct Case {
-        const char* mode;
-        std::vector<std::string> expected;
-    };
-    const std::vector<Case> cases = {
-        {"SINGLE", {"PMCD_INST.REL=GND", "DCM_ADV_INST.CLK0=CLK0_OUT", "CLK0_OUT[USELOCALROUTING]=TRUE",
-                    "DCM_ADV_INST.CLKFB=CLKFB_IBUFG", "CLK0_BUFG_INST:"}},
-        {"PARALLEL", {"PMCD_INST1.REL=LOCKED_OUT", "PMCD_INST2.REL=LOCKED_OUT", "DCM_ADV_INST.LOCKED=LOCKED_OUT",
-                      "LOCKED_OUT is out", "DCM_ADV_INST.CLK90=CLK90_OUT", "CLK90_OUT[USELOCALROUTING]=TRUE"}},
-    };
-    for (const auto& c : cases) {
-        SCOPED_TRACE(c.mode);
-        TestDesign d("dcm", "t5da1-1");
-        d.MarkLoaded();
-        d.Instantiate();
-        Tsy_Block* b = d.Wizard().GetActiveDCMBlk(1, true);
-        Set(b, "TESY_ONLY_PMCD", c.mode);
-        if (std::string(c.mode) == "SINGLE") {
-            Set(b, "FB_SOURCE", "EXTERNAL");
+        std::vector<std::string> errors = Texts(d.Stream().Errors());
+        if (c.message.empty()) {
+            ASSERT_FALSE(errors.empty());
+            EXPECT_NE(errors.back().find("buffers of the PMCD outputs"), std::string::npos) << errors.back();
         } else {
-            Use(b, "LOCKED", false); // the PMCDs need it all the same
-            Use(b, "CLK90");
+            EXPECT_EQ(errors, std::vector<std::string>{c.message});
         }
-        EXPECT_EQ(d.Wizard().Finish(), -1);
-        std::vector<StringBase> errors = d.Stream().Errors();
-        ASSERT_FALSE(errors.empty());
-        EXPECT_NE(errors.back().str().find("buffers of the PMCD outputs"), std::string::npos) << errors.back();
-        expectNetlist(NetlistView(d.Data()), c.expected, c.mode);
+        expectNetlist(NetlistView(d.Data()), c.built, c.recipe);
     }
 }
 
@@ -366,7 +326,7 @@ namespace {
 
 CommandResult pendra(const std::string& args)
 {
-    return RunCommand(std::string(PENDRA_BIN_DIR) + "/pendra generate " + args);
+    return RunCommand(PendraProgram() + " generate " + args);
 }
 
 std::unique_ptr<Tsy_WizData> loadWritten(const std::string& path, const std::string& part)

@@ -10,8 +10,8 @@
 #include "hdl/Tsy_HdlWriter.h"
 #include "lib/Tsy_PrimitiveLibrary.h"
 #include "run/Tsy_HostSession.h"
+#include "support/BatchRun.h"
 #include "support/DcmDesigns.h"
-#include "support/TestDesign.h"
 
 #include <gtest/gtest.h>
 
@@ -220,7 +220,7 @@ TEST(HdlTools, BatchRunOutputPassesEveryTool)
                                "older"}}) {
         SCOPED_TRACE(c.args);
         TempDir out;
-        CommandResult r = RunCommand(std::string(PENDRA_BIN_DIR) + "/pendra generate " + c.args + " -o " + out.Path());
+        CommandResult r = RunCommand(PendraProgram() + " generate " + c.args + " -o " + out.Path());
         ASSERT_EQ(r.status, 0) << r.err;
         const std::string m = c.module;
         Tsy_HdlFiles files{ReadTextFile(out.File(m + ".v")), ReadTextFile(out.File(m + ".vhd")),

@@ -3,41 +3,25 @@
 // what the form then shows. With PENDRA_SCREENSHOT_DIR set, the window is
 // also saved as pictures for a person to look at.
 
-#include "gui/Gq_Wizard.h"
-#include "gui/Gq_WizardPage.h"
 #include "pages/dcm/Tsy_JitterDlg.h"
 #include "pages/dcm/Tsy_JitterDlgGui.h"
+#include "support/GuiTest.h"
 #include "support/TestDesign.h"
 #include "wizard/Tsy_Vocabulary.h"
 
-#include <QApplication>
 #include <QGroupBox>
 #include <QLabel>
-#include <QLineEdit>
 #include <QPushButton>
-#include <QRadioButton>
 #include <QTest>
 
 #include <gtest/gtest.h>
 
-#include <cstdlib>
-#include <functional>
 #include <memory>
 
 namespace {
 
-// The page the synthesizer page leads to.
-class NextProbe : public Gq_WizardPage {
-public:
-    NextProbe()
-    {
-        setPageName("Summary");
-        setPageWidget(new QLabel("next"));
-    }
-};
-
-// A wizard window holding the synthesizer page of a design, followed by one
-// more page so that Next has somewhere to go.
+// A wizard window holding the synthesizer page of a design whose DCM runs at
+// 100 MHz with both output groups, as General Setup leaves it.
 class Rig {
 public:
     Rig(const char* part, const std::function<void(Tsy_Block&)>& setup, const char* keyword = "dcm", int inst = 1)
@@ -45,90 +29,34 @@ public:
     {
         d.MarkLoaded();
         d.Instantiate();
-        for (int i = 0; i < Tsy_WizMain::kPageSlots; ++i)
-            if (auto* p = dynamic_cast<Tsy_JitterDlg*>(d.Wizard().GetPage(i)); p && p->GetInstNum() == inst)
-                page = p;
         dcm = d.Wizard().GetActiveDCMBlk(inst, false);
-        if (!page || !dcm)
-            return;
         dcm->SetAttributeValue(Tsy_Attr::TESY_ONLY_CLKIN_VALUE, "100");
         dcm->SetAttributeValue(Tsy_Attr::TSY_CLK_OUTPUT_TYPE, "DLL_AND_FX");
         dcm->SetAttributeValue(Tsy_Attr::TESY_ONLY_VALID_DFS_MODE, "BOTH");
         if (setup)
             setup(*dcm);
-        window = std::make_unique<Gq_Wizard>();
-        page->CreateGui(window.get());
-        gui = dynamic_cast<Tsy_JitterDlgGui*>(page->GetGui());
-        if (!gui)
-            return;
-        window->addPage(gui);
-        window->addPage(&after);
-        window->show();
-        window->activateWindow();
-        // Accelerators reach only the active window.
-        active = QTest::qWaitForWindowActive(window.get());
-        window->start();
+        w = std::make_unique<PageWindow>(FindPage<Tsy_JitterDlg>(d.Wizard(), inst));
+        gui = w->gui;
     }
 
-    // The form's controls, found by name as a test tool finds them.
-    template <typename T>
-    T* Find(const char* name)
-    {
-        T* w = gui->pageWidget() ? gui->pageWidget()->findChild<T*>(name) : nullptr;
-        EXPECT_NE(w, nullptr) << name;
-        return w;
-    }
-    QLineEdit* Edit(const char* name) { return Find<QLineEdit>(name); }
-    QAbstractButton* Button(const char* name) { return Find<QAbstractButton>(name); }
+    QLineEdit* Edit(const char* name) { return Named<QLineEdit>(gui->pageWidget(), name); }
+    QAbstractButton* Button(const char* name) { return Named<QAbstractButton>(gui->pageWidget(), name); }
     std::string Label(const char* name)
     {
-        QLabel* l = Find<QLabel>(name);
+        QLabel* l = Named<QLabel>(gui->pageWidget(), name);
         return l ? l->text().toStdString() : "(missing)";
     }
-    std::string EditText(const char* name)
-    {
-        QLineEdit* e = Edit(name);
-        return e ? e->text().toStdString() : "(missing)";
-    }
+    std::string EditText(const char* name) { return Edit(name)->text().toStdString(); }
     void Click(QAbstractButton* b) { QTest::mouseClick(b, Qt::LeftButton); }
-    void Type(QLineEdit* edit, const char* text)
-    {
-        edit->selectAll();
-        QTest::keyClick(edit, Qt::Key_Delete);
-        QTest::keyClicks(edit, text);
-    }
-    std::string Title() { return window->findChild<QLabel*>("WizardPageTitle")->text().toStdString(); }
-    std::vector<StringBase> Errors() { return d.Stream().Errors(); }
-
-    // For a person checking the layout: the window as it looks now.
-    void Snap(const char* name)
-    {
-        const char* dir = std::getenv("PENDRA_SCREENSHOT_DIR");
-        if (!dir || !*dir)
-            return;
-        // Layouts settle on the next turn of the event loop.
-        QApplication::processEvents();
-        if (dir && *dir)
-            window->grab().save(QString("%1/%2.png").arg(dir, name));
-    }
+    void Next() { Click(w->window.button(Gq_Wizard::Next)); }
+    std::string Title() { return w->window.findChild<QLabel*>("WizardPageTitle")->text().toStdString(); }
+    std::vector<std::string> Errors() { return Texts(d.Stream().Errors()); }
 
     TestDesign d;
-    Tsy_JitterDlg* page = nullptr;
-    Tsy_JitterDlgGui* gui = nullptr;
     Tsy_Block* dcm = nullptr;
-    bool active = false;
-    NextProbe after;
-    std::unique_ptr<Gq_Wizard> window;
+    std::unique_ptr<PageWindow> w;
+    Gq_WizardPage* gui = nullptr;
 };
-
-// Runs the event loop until the condition holds (an accelerator clicks its
-// button a moment after the key), for at most a few seconds.
-bool eventually(const std::function<bool()>& condition)
-{
-    for (int i = 0; i < 250 && !condition(); ++i)
-        QTest::qWait(20);
-    return condition();
-}
 
 } // namespace
 
@@ -140,8 +68,8 @@ TEST(ClockSynthForm, ChoosingMAndDAndCalculatingShowsTheGeneratedOutput)
     r.Click(r.Button("RadioButtonMandD"));
     EXPECT_TRUE(r.Edit("LineEditM")->isEnabled());
     EXPECT_FALSE(r.Edit("LineEditFout")->isEnabled());
-    r.Type(r.Edit("LineEditM"), "1");
-    r.Type(r.Edit("LineEditD"), "3");
+    Retype(r.Edit("LineEditM"), "1");
+    Retype(r.Edit("LineEditD"), "3");
     r.Click(r.Button("PushButtonCalculate"));
     EXPECT_TRUE(r.Errors().empty());
     // M = 1 is doubled with D, in the entries and in the result.
@@ -154,7 +82,7 @@ TEST(ClockSynthForm, ChoosingMAndDAndCalculatingShowsTheGeneratedOutput)
     // J = 6*4/32 + (33.333 - 24)*14/216 + 2 = 3.355 % of a 30 ns period.
     EXPECT_EQ(r.Label("TextLabelPeriodUIValue"), "0.03");
     EXPECT_EQ(r.Label("TextLabelPeriodPk2PkValue"), "1.01");
-    r.Snap("clock_synth_m_and_d");
+    Snap(&r.w->window, "clock_synth_m_and_d");
 }
 
 TEST(ClockSynthForm, TheEntryShowsTheInputClockAndTheValidRanges)
@@ -167,7 +95,7 @@ TEST(ClockSynthForm, TheEntryShowsTheInputClockAndTheValidRanges)
     EXPECT_EQ(r.Title(), "Clock Frequency Synthesizer");
     EXPECT_EQ(r.Label("TextLabelInputFrequency"), "Input Clock Frequency:");
     EXPECT_EQ(r.Label("TextLabelFinDivBy2"), "100 MHz => divided by 2 = 50.000 MHz");
-    EXPECT_EQ(r.Find<QGroupBox>("GroupBoxRangeTable")->title().toStdString(), "Valid Ranges for Speed Grade -4");
+    EXPECT_EQ(Named<QGroupBox>(r.gui->pageWidget(), "GroupBoxRangeTable")->title().toStdString(), "Valid Ranges for Speed Grade -4");
     EXPECT_EQ(r.Label("TextLabelFinRangeTitle"), "<b>Fin (MHz)</b>");
     EXPECT_EQ(r.Label("TextLabelLfFinValue"), "1.000 - 210.000");
     EXPECT_EQ(r.Label("TextLabelHfFinValue"), "50.000 - 420.000");
@@ -176,9 +104,9 @@ TEST(ClockSynthForm, TheEntryShowsTheInputClockAndTheValidRanges)
     // Loading calculated already: 150 / 50 = 3 / 1.
     EXPECT_EQ(r.Label("TextLabelMValue"), "3");
     EXPECT_EQ(r.Label("TextLabelDValue"), "1");
-    EXPECT_TRUE(r.window->button(Gq_Wizard::MoreInfo)->isVisible());
-    EXPECT_FALSE(r.window->button(Gq_Wizard::Advanced)->isVisible());
-    r.Snap("clock_synth_entry");
+    EXPECT_TRUE(r.w->window.button(Gq_Wizard::MoreInfo)->isVisible());
+    EXPECT_FALSE(r.w->window.button(Gq_Wizard::Advanced)->isVisible());
+    Snap(&r.w->window, "clock_synth_entry");
 }
 
 TEST(ClockSynthForm, OutputInNanosecondsTurnsTheEntryAndTheTableIntoPeriods)
@@ -201,24 +129,25 @@ TEST(ClockSynthForm, RefusalsSayWhyAndNextStoresOnceTheEntryIsSound)
     Rig r("t2a250-4", {});
     ASSERT_NE(r.gui, nullptr);
     r.Click(r.Button("RadioButtonMandD"));
-    r.Type(r.Edit("LineEditM"), "40");
+    Retype(r.Edit("LineEditM"), "40");
     r.Click(r.Button("PushButtonCalculate"));
-    ASSERT_EQ(r.Errors().size(), 1u);
-    EXPECT_EQ(r.Errors()[0], "The Multiply (M) value must be within the range 2 - 32.  Please choose a new value.");
+    EXPECT_EQ(r.Errors(),
+              std::vector<std::string>{"The Multiply (M) value must be within the range 2 - 32.  Please choose a new "
+                                       "value."});
     EXPECT_EQ(r.Label("TextLabelMValue"), "-");
     EXPECT_EQ(r.Label("TextLabelPeriodUIValue"), "-");
 
     r.d.Stream().Clear();
     r.Click(r.Button("RadioButtonFout"));
-    r.Type(r.Edit("LineEditFout"), "33.3");
-    r.Click(r.window->button(Gq_Wizard::Next));
-    EXPECT_EQ(r.window->currentIndex(), 0);
+    Retype(r.Edit("LineEditFout"), "33.3");
+    r.Next();
+    EXPECT_EQ(r.w->window.currentIndex(), 0);
     ASSERT_EQ(r.Errors().size(), 1u);
-    EXPECT_NE(r.Errors()[0].str().find("generates the value M = 33."), std::string::npos);
+    EXPECT_NE(r.Errors()[0].find("generates the value M = 33."), std::string::npos);
 
-    r.Type(r.Edit("LineEditFout"), "150");
-    r.Click(r.window->button(Gq_Wizard::Next));
-    EXPECT_EQ(r.window->currentIndex(), 1);
+    Retype(r.Edit("LineEditFout"), "150");
+    r.Next();
+    EXPECT_EQ(r.w->window.currentIndex(), 1);
     EXPECT_EQ(r.dcm->GetAttributeValue(Tsy_Attr::CLKFX_MULTIPLY), "3");
     EXPECT_EQ(r.dcm->GetAttributeValue(Tsy_Attr::CLKFX_DIVIDE), "2");
     EXPECT_EQ(r.dcm->GetAttributeValue(Tsy_Attr::FOUT_VALUE), "150");
@@ -230,21 +159,21 @@ TEST(ClockSynthForm, EntriesTakeOnlyNumbersAndAcceleratorsChooseTheInput)
 {
     Rig r("t2a250-4", {});
     ASSERT_NE(r.gui, nullptr);
-    ASSERT_TRUE(r.active);
-    r.Type(r.Edit("LineEditFout"), "1a2.5x.3");
+    ASSERT_TRUE(r.w->active);
+    Retype(r.Edit("LineEditFout"), "1a2.5x.3");
     EXPECT_EQ(r.EditText("LineEditFout"), "12.53");
-    QTest::keyClick(r.window.get(), Qt::Key_S, Qt::AltModifier);
-    EXPECT_TRUE(eventually([&] { return r.Edit("LineEditM")->isEnabled(); }));
+    QTest::keyClick(&r.w->window, Qt::Key_S, Qt::AltModifier);
+    EXPECT_TRUE(Eventually([&] { return r.Edit("LineEditM")->isEnabled(); }));
     EXPECT_TRUE(r.Button("RadioButtonMandD")->isChecked());
-    r.Type(r.Edit("LineEditM"), "12345");
+    Retype(r.Edit("LineEditM"), "12345");
     EXPECT_EQ(r.EditText("LineEditM"), "123");
-    QTest::keyClick(r.window.get(), Qt::Key_U, Qt::AltModifier);
-    EXPECT_TRUE(eventually([&] { return r.Edit("LineEditFout")->isEnabled(); }));
-    r.Type(r.Edit("LineEditFout"), "125");
-    QTest::keyClick(r.window.get(), Qt::Key_N, Qt::AltModifier);
-    EXPECT_TRUE(eventually([&] { return r.EditText("LineEditFout") == "8"; }));
+    QTest::keyClick(&r.w->window, Qt::Key_U, Qt::AltModifier);
+    EXPECT_TRUE(Eventually([&] { return r.Edit("LineEditFout")->isEnabled(); }));
+    Retype(r.Edit("LineEditFout"), "125");
+    QTest::keyClick(&r.w->window, Qt::Key_N, Qt::AltModifier);
+    EXPECT_TRUE(Eventually([&] { return r.EditText("LineEditFout") == "8"; }));
     EXPECT_TRUE(r.Button("RadioButtonFoutNs")->isChecked());
-    EXPECT_EQ(r.window->currentIndex(), 0);
+    EXPECT_EQ(r.w->window.currentIndex(), 0);
 }
 
 TEST(ClockSynthForm, CaptionsFollowTheWizardType)
@@ -252,31 +181,25 @@ TEST(ClockSynthForm, CaptionsFollowTheWizardType)
     struct Case {
         const char* keyword;
         int inst;
-        const char* title;
-        const char* ui;
-        const char* pk2pk;
+        const char *title, *jitter; // the jitter captions read "<b>Period Jitter" + jitter + "(unit interval)</b>"
     } cases[] = {
-        {"dcm", 1, "Clock Frequency Synthesizer", "<b>Period Jitter<br>(unit interval)</b>",
-         "<b>Period Jitter<br>(pk-to-pk ns)</b>"},
-        {"dcm_dcm2pll", 1, "Clock Frequency Synthesizer", "<b>Period Jitter Before PLL Filter (unit interval)</b>",
-         "<b>Period Jitter Before PLL Filter (pk-to-pk ns)</b>"},
-        {"dcm_pll2dcm", 1, "Clock Frequency Synthesizer", "<b>Period Jitter After PLL Filter (unit interval)</b>",
-         "<b>Period Jitter After PLL Filter (pk-to-pk ns)</b>"},
-        {"dcm_bddeskew", 2, "Clock Frequency Synthesizer for INST2", "<b>Period Jitter<br>(unit interval)</b>",
-         "<b>Period Jitter<br>(pk-to-pk ns)</b>"},
-        {"dcm_cascading", 1, "Clock Frequency Synthesizer for INST1", "<b>Period Jitter<br>(unit interval)</b>",
-         "<b>Period Jitter<br>(pk-to-pk ns)</b>"},
+        {"dcm", 1, "Clock Frequency Synthesizer", "<br>"},
+        {"dcm_dcm2pll", 1, "Clock Frequency Synthesizer", " Before PLL Filter "},
+        {"dcm_pll2dcm", 1, "Clock Frequency Synthesizer", " After PLL Filter "},
+        {"dcm_bddeskew", 2, "Clock Frequency Synthesizer for INST2", "<br>"},
+        {"dcm_cascading", 1, "Clock Frequency Synthesizer for INST1", "<br>"},
     };
     for (const auto& c : cases) {
+        SCOPED_TRACE(c.keyword);
         Rig r("t5da1-1", {}, c.keyword, c.inst);
-        ASSERT_NE(r.gui, nullptr) << c.keyword;
-        EXPECT_EQ(r.Title(), c.title) << c.keyword;
+        ASSERT_NE(r.gui, nullptr);
+        EXPECT_EQ(r.Title(), c.title);
         EXPECT_EQ(r.gui->pageWidget()->windowTitle().toStdString(), std::string("Corvane Pendra - ") + c.title);
-        EXPECT_EQ(r.Label("TextLabelPeriodUITitle"), c.ui) << c.keyword;
-        EXPECT_EQ(r.Label("TextLabelPeriodPk2PkTitle"), c.pk2pk) << c.keyword;
+        EXPECT_EQ(r.Label("TextLabelPeriodUITitle"), std::string("<b>Period Jitter") + c.jitter + "(unit interval)</b>");
+        EXPECT_EQ(r.Label("TextLabelPeriodPk2PkTitle"), std::string("<b>Period Jitter") + c.jitter + "(pk-to-pk ns)</b>");
         // The newest families show the figures to the nanosecond's thousandth.
-        EXPECT_EQ(r.Label("TextLabelPeriodPk2PkValue").size(), 5) << c.keyword;
+        EXPECT_EQ(r.Label("TextLabelPeriodPk2PkValue").size(), 5);
         if (std::string(c.keyword) == "dcm_dcm2pll")
-            r.Snap("clock_synth_dcm2pll");
+            Snap(&r.w->window, "clock_synth_dcm2pll");
     }
 }

@@ -6,11 +6,10 @@
 // through whole batch runs of pendra.
 
 #include "pages/dcm/Tsy_JitterDlg.h"
-#include "support/TestDesign.h"
+#include "support/BatchRun.h"
 #include "wizard/Tsy_Vocabulary.h"
 
 #include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
 
 #include <cmath>
 #include <functional>
@@ -29,12 +28,10 @@ public:
         if (context)
             d.Configure(context);
         d.Instantiate();
-        for (int i = 0; i < Tsy_WizMain::kPageSlots; ++i)
-            if (auto* p = dynamic_cast<Tsy_JitterDlg*>(d.Wizard().GetPage(i)); p && p->GetInstNum() == inst)
-                page = p;
+        page = FindPage<Tsy_JitterDlg>(d.Wizard(), inst);
         dcm = d.Wizard().GetActiveDCMBlk(inst, false);
-        if (page && dcm)
-            Input("100").General("DLL_AND_FX", "BOTH");
+        EXPECT_TRUE(page && dcm);
+        Input("100").General("DLL_AND_FX", "BOTH");
     }
 
     SynthPage& Input(const char* value, const char* units = "MHZ", bool divideBy2 = false)
@@ -105,12 +102,9 @@ std::string typedRange(char which)
 TEST(ClockSynthPage, DerivesMAndDFromTheOutputFrequency)
 {
     struct Case {
-        const char* fin;
-        const char* fout;
-        const char* units; // of the output
-        int m, d;          // 0: refused with the error
-        const char* shown; // generated output, in the output's units
-        const char* kept;  // FOUT_VALUE after Next
+        const char *fin, *fout, *units; // units of the output
+        int m, d;                       // 0: refused with the error
+        const char *shown, *kept;       // generated output in the output's units; FOUT_VALUE after Next
         std::string error;
     } cases[] = {
         {"50", "100", "MHZ", 2, 1, "100", "100", ""},
@@ -133,36 +127,30 @@ TEST(ClockSynthPage, DerivesMAndDFromTheOutputFrequency)
     };
     for (const auto& c : cases) {
         SynthPage p("t2a250-4");
-        ASSERT_NE(p.page, nullptr);
         p.Input(c.fin).ByOutput(c.fout, c.units);
         bool ok = p.EnterAndNext();
-        std::string what = std::string("fin ") + c.fin + ", fout " + c.fout + " " + c.units;
+        SCOPED_TRACE(std::string("fin ") + c.fin + ", fout " + c.fout + " " + c.units);
         if (c.m == 0) {
-            EXPECT_FALSE(ok) << what;
-            EXPECT_EQ(p.OnlyError(), c.error) << what;
-            EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_MULTIPLY), "2") << what << ": the template's value stays";
+            EXPECT_FALSE(ok);
+            EXPECT_EQ(p.OnlyError(), c.error);
+            EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_MULTIPLY), "2") << "the template's value stays";
             continue;
         }
-        ASSERT_TRUE(ok) << what << ": " << p.OnlyError();
-        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_MULTIPLY), std::to_string(c.m)) << what;
-        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_DIVIDE), std::to_string(c.d)) << what;
-        EXPECT_EQ(p.page->GetOutputText(), c.shown) << what;
-        EXPECT_EQ(p.Get(Tsy_Attr::FOUT_VALUE), c.kept) << what;
-        EXPECT_EQ(p.Get(Tsy_Attr::FOUT_UNITS), c.units) << what;
+        ASSERT_TRUE(ok) << p.OnlyError();
+        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_MULTIPLY), std::to_string(c.m));
+        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_DIVIDE), std::to_string(c.d));
+        EXPECT_EQ(p.page->GetOutputText(), c.shown);
+        EXPECT_EQ(p.Get(Tsy_Attr::FOUT_VALUE), c.kept);
+        EXPECT_EQ(p.Get(Tsy_Attr::FOUT_UNITS), c.units);
     }
 }
 
 TEST(ClockSynthPage, DerivesTheOutputFromMAndD)
 {
     struct Case {
-        const char* fin;
-        const char* finUnits;
-        const char* m;
-        const char* d;
-        int rm, rd;             // CLKFX values; 0: refused
-        const char* shown;      // generated output
-        const char* mText;      // the entries as the page shows them
-        const char* dText;
+        const char *fin, *finUnits, *m, *d;
+        int rm, rd;                        // CLKFX values; 0: refused
+        const char *shown, *mText, *dText; // generated output; the entries as the page shows them
         std::string error;
     } cases[] = {
         {"100", "MHZ", "1", "3", 2, 6, "33.3333", "2", "6", ""}, // M = 1 doubles
@@ -185,22 +173,22 @@ TEST(ClockSynthPage, DerivesTheOutputFromMAndD)
         p.Input(c.fin, c.finUnits).ByMAndD(c.m, c.d);
         // Entering the page calculates and says what is wrong.
         p.page->LoadFromBlock();
-        std::string what = std::string("M ") + c.m + ", D " + c.d;
-        EXPECT_EQ(p.page->GetMText(), c.mText) << what;
-        EXPECT_EQ(p.page->GetDText(), c.dText) << what;
+        SCOPED_TRACE(std::string("M ") + c.m + ", D " + c.d);
+        EXPECT_EQ(p.page->GetMText(), c.mText);
+        EXPECT_EQ(p.page->GetDText(), c.dText);
         if (c.rm == 0) {
-            EXPECT_EQ(p.OnlyError(), c.error) << what;
-            EXPECT_FALSE(p.page->HasResult()) << what;
-            EXPECT_FALSE(p.page->StoreToBlock(true)) << what;
+            EXPECT_EQ(p.OnlyError(), c.error);
+            EXPECT_FALSE(p.page->HasResult());
+            EXPECT_FALSE(p.page->StoreToBlock(true));
             continue;
         }
-        EXPECT_TRUE(p.Errors().empty()) << what << ": " << p.OnlyError();
-        EXPECT_EQ(p.page->GetOutputText(), c.shown) << what;
-        ASSERT_TRUE(p.page->StoreToBlock(true)) << what << ": " << p.OnlyError();
-        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_MULTIPLY), std::to_string(c.rm)) << what;
-        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_DIVIDE), std::to_string(c.rd)) << what;
-        EXPECT_EQ(p.Get(Tsy_Attr::M_VALUE), c.mText) << what;
-        EXPECT_EQ(p.Get(Tsy_Attr::D_VALUE), c.dText) << what;
+        EXPECT_TRUE(p.Errors().empty()) << p.OnlyError();
+        EXPECT_EQ(p.page->GetOutputText(), c.shown);
+        ASSERT_TRUE(p.page->StoreToBlock(true)) << p.OnlyError();
+        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_MULTIPLY), std::to_string(c.rm));
+        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_DIVIDE), std::to_string(c.rd));
+        EXPECT_EQ(p.Get(Tsy_Attr::M_VALUE), c.mText);
+        EXPECT_EQ(p.Get(Tsy_Attr::D_VALUE), c.dText);
         EXPECT_EQ(p.Get(Tsy_Attr::JITTER_INPUT_TYPE), "M_AND_D_STR");
     }
 }
@@ -210,8 +198,7 @@ TEST(ClockSynthPage, ADcmWithoutSynthesizerOutputsIsNotHeldUpByTheSynthesizer)
     // 33.33 MHz in and the untouched 200 MHz out give M = 200: a refusal only
     // where CLKFX or CLKFX180 is in use.
     struct Case {
-        const char* outputs;
-        const char* fin;
+        const char *outputs, *fin;
         bool passes;
         const char* m; // CLKFX_MULTIPLY after Next
     } cases[] = {{"DLL", "33.33", true, "2"},       {"", "33.33", true, "2"}, {"FX", "33.33", false, "2"},
@@ -220,23 +207,20 @@ TEST(ClockSynthPage, ADcmWithoutSynthesizerOutputsIsNotHeldUpByTheSynthesizer)
         SynthPage p("t2a250-4");
         p.Input(c.fin).General(c.outputs, "BOTH").ByOutput("200");
         p.page->LoadFromBlock();
-        std::string what = std::string(c.outputs) + " at " + c.fin;
-        EXPECT_EQ(p.Errors().size(), c.passes ? 0u : 1u) << what << ": entering the page";
-        EXPECT_EQ(p.EnterAndNext(), c.passes) << what;
-        EXPECT_EQ(p.Errors().size(), c.passes ? 0u : 1u) << what << ": " << p.OnlyError();
-        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_MULTIPLY), c.m) << what;
+        SCOPED_TRACE(std::string(c.outputs) + " at " + c.fin);
+        EXPECT_EQ(p.Errors().size(), c.passes ? 0u : 1u) << "entering the page";
+        EXPECT_EQ(p.EnterAndNext(), c.passes);
+        EXPECT_EQ(p.Errors().size(), c.passes ? 0u : 1u) << p.OnlyError();
+        EXPECT_EQ(p.Get(Tsy_Attr::CLKFX_MULTIPLY), c.m);
     }
 }
 
 TEST(ClockSynthPage, TheInputClockCountsInItsUnitsAndAfterDividingByTwo)
 {
     struct Case {
-        const char* value; // empty: only CLKIN_PERIOD is known
-        const char* units;
+        const char *value, *units; // value empty: only CLKIN_PERIOD is known
         bool divideBy2;
-        const char* m;
-        const char* d;
-        const char* line;
+        const char *m, *d, *line;
     } cases[] = {
         {"100", "MHZ", false, "3", "2", "Input Clock Frequency: 100 MHz"},
         {"100", "MHZ", true, "3", "1", "Input Clock Frequency: 100 MHz => divided by 2 = 50.000 MHz"},
@@ -274,8 +258,7 @@ TEST(ClockSynthPage, TheOutputMustFitTheModeGeneralSetupAllowed)
             .str();
     };
     struct Case {
-        const char* outputs;
-        const char* allowed;
+        const char *outputs, *allowed;
         bool mAndD;
         const char* value;  // fout, or M with D = 1, at 100 MHz in
         std::string error;  // empty: passes
@@ -297,11 +280,11 @@ TEST(ClockSynthPage, TheOutputMustFitTheModeGeneralSetupAllowed)
         else
             p.ByOutput(c.value);
         bool ok = p.EnterAndNext();
-        std::string what = std::string(c.outputs) + " " + c.allowed + " " + c.value;
-        EXPECT_EQ(ok, c.error.empty()) << what;
-        EXPECT_EQ(p.OnlyError(), c.error.empty() ? "(0 errors)" : c.error) << what;
-        EXPECT_EQ(p.Get(Tsy_Attr::DFS_FREQUENCY_MODE), c.stored) << what;
-        EXPECT_TRUE(p.page->HasResult()) << what << ": the derived output is shown either way";
+        SCOPED_TRACE(std::string(c.outputs) + " " + c.allowed + " " + c.value);
+        EXPECT_EQ(ok, c.error.empty());
+        EXPECT_EQ(p.OnlyError(), c.error.empty() ? "(0 errors)" : c.error);
+        EXPECT_EQ(p.Get(Tsy_Attr::DFS_FREQUENCY_MODE), c.stored);
+        EXPECT_TRUE(p.page->HasResult()) << "the derived output is shown either way";
     }
 }
 
@@ -312,9 +295,7 @@ TEST(ClockSynthPage, StoresTheJitterOfTheModelInForce)
     struct Case {
         const char* part;
         bool noiseFree;
-        const char* fin;
-        const char* fout;
-        const char* perf;
+        const char *fin, *fout, *perf;
         double ui, ns; // worked out by hand
     } cases[] = {
         // taldor2, low: J = 6*4/32 + 36*14/216 + 2 = 5.0833 %, T = 16.667 ns.
@@ -334,22 +315,22 @@ TEST(ClockSynthPage, StoresTheJitterOfTheModelInForce)
         SynthPage p(c.part, false, "dcm", 1, [&](Tsy_WizContext& ctx) { ctx.bufgctrlFamily = c.noiseFree; });
         p.Input(c.fin).ByOutput(c.fout).Set(Tsy_Attr::DCM_PERFORMANCE_MODE, c.perf);
         p.Set(Tsy_Attr::TESY_ONLY_JITTER_UI_NONOISE, "stale").Set(Tsy_Attr::JITTER_VALUE, "stale");
-        std::string what = std::string(c.part) + " " + c.fin + " -> " + c.fout;
-        ASSERT_TRUE(p.EnterAndNext()) << what << ": " << p.OnlyError();
+        SCOPED_TRACE(std::string(c.part) + " " + c.fin + " -> " + c.fout);
+        ASSERT_TRUE(p.EnterAndNext()) << p.OnlyError();
         const char* format = c.noiseFree ? "%3.3f" : "%3.2f";
         std::string ui = StringBase::Printf(format, c.ui).str(), ns = StringBase::Printf(format, c.ns).str();
-        EXPECT_EQ(p.page->GetJitterUiText(), ui) << what;
-        EXPECT_EQ(p.page->GetJitterPk2PkText(), ns) << what;
+        EXPECT_EQ(p.page->GetJitterUiText(), ui);
+        EXPECT_EQ(p.page->GetJitterPk2PkText(), ns);
         if (c.noiseFree) {
-            EXPECT_EQ(p.Get(Tsy_Attr::TESY_ONLY_JITTER_UI_NONOISE), ui) << what;
-            EXPECT_EQ(p.Get(Tsy_Attr::TESY_ONLY_JITTER_PK2PK_NONOISE), ns) << what;
+            EXPECT_EQ(p.Get(Tsy_Attr::TESY_ONLY_JITTER_UI_NONOISE), ui);
+            EXPECT_EQ(p.Get(Tsy_Attr::TESY_ONLY_JITTER_PK2PK_NONOISE), ns);
         } else {
-            EXPECT_EQ(p.Get(Tsy_Attr::JITTER_VALUE), ui) << what;
-            EXPECT_EQ(p.Get(Tsy_Attr::JITTER_PK2PK), ns) << what;
+            EXPECT_EQ(p.Get(Tsy_Attr::JITTER_VALUE), ui);
+            EXPECT_EQ(p.Get(Tsy_Attr::JITTER_PK2PK), ns);
         }
         // Figures of the other model do not stay behind.
         const char* other = c.noiseFree ? Tsy_Attr::JITTER_VALUE : Tsy_Attr::TESY_ONLY_JITTER_UI_NONOISE;
-        EXPECT_EQ(p.dcm->GetNamedAttribute(other), nullptr) << what;
+        EXPECT_EQ(p.dcm->GetNamedAttribute(other), nullptr);
     }
 }
 
@@ -400,22 +381,13 @@ TEST(ClockSynthPage, ValidRangesInTheUnitsOfTheSelectedInput)
     struct Case {
         const char* part;
         bool mAndD;
-        const char* foutUnits;
-        const char* finUnits;
-        const char* title;
-        const char* header;
-        const char* lowIn;
-        const char* highOut;
+        const char *foutUnits, *finUnits, *header, *lowIn, *highOut;
     } cases[] = {
-        {"t2a250-4", false, "MHZ", "NS", "Valid Ranges for Speed Grade -4", "<b>Fin (MHz)</b>", "1.000 - 210.000",
-         "210.000 - 420.000"},
-        {"t2a250-4", false, "NS", "MHZ", "Valid Ranges for Speed Grade -4", "<b>Fin (ns)</b>", "4.762 - 1000.000",
-         "2.381 - 4.762"},
-        {"t2a250-4", true, "MHZ", "NS", "Valid Ranges for Speed Grade -4", "<b>Fin (ns)</b>", "4.762 - 1000.000",
-         "2.381 - 4.762"},
+        {"t2a250-4", false, "MHZ", "NS", "<b>Fin (MHz)</b>", "1.000 - 210.000", "210.000 - 420.000"},
+        {"t2a250-4", false, "NS", "MHZ", "<b>Fin (ns)</b>", "4.762 - 1000.000", "2.381 - 4.762"},
+        {"t2a250-4", true, "MHZ", "NS", "<b>Fin (ns)</b>", "4.762 - 1000.000", "2.381 - 4.762"},
         // One mode only: the high row holds nothing, and no period divides by zero.
-        {"m3e100-4", false, "NS", "MHZ", "Valid Ranges for Speed Grade -4", "<b>Fin (ns)</b>", "3.215 - 5000.000",
-         "0.000 - 0.000"},
+        {"m3e100-4", false, "NS", "MHZ", "<b>Fin (ns)</b>", "3.215 - 5000.000", "0.000 - 0.000"},
     };
     for (const auto& c : cases) {
         SynthPage p(c.part);
@@ -425,11 +397,11 @@ TEST(ClockSynthPage, ValidRangesInTheUnitsOfTheSelectedInput)
         else
             p.ByOutput("100", c.foutUnits);
         p.page->LoadFromBlock();
-        std::string what = std::string(c.part) + (c.mAndD ? " M and D" : " output ") + c.foutUnits;
-        EXPECT_EQ(p.page->GetRangeTableTitle(), c.title) << what;
-        EXPECT_EQ(p.page->GetRangeHeader(false), c.header) << what;
-        EXPECT_EQ(p.page->GetRangeText(false, false), c.lowIn) << what;
-        EXPECT_EQ(p.page->GetRangeText(true, true), c.highOut) << what;
+        SCOPED_TRACE(std::string(c.part) + (c.mAndD ? " M and D" : " output ") + c.foutUnits);
+        EXPECT_EQ(p.page->GetRangeTableTitle(), "Valid Ranges for Speed Grade -4");
+        EXPECT_EQ(p.page->GetRangeHeader(false), c.header);
+        EXPECT_EQ(p.page->GetRangeText(false, false), c.lowIn);
+        EXPECT_EQ(p.page->GetRangeText(true, true), c.highOut);
     }
 }
 
@@ -441,23 +413,20 @@ TEST(ClockSynthPage, TheSecondCascadedDcmIsLimitedBehindADoubledFastInput)
         "DCM_INST2 output frequency is limited to 1/2 of the maximum frequency range.\n\n.  The valid CLKIN frequency "
         "for DCM_INST2 in this configuration is 24.000 - 105.000 MHz.";
     struct Case {
-        const char* cascadingClk;
-        const char* firstInput;
-        const char* fout;
+        const char *cascadingClk, *firstInput, *fout;
         bool passes;
     } cases[] = {{"CLK2X", "60", "150", false}, {"CLK2X180", "60", "150", false}, {"CLK2X", "60", "105", true},
                  {"CLK2X", "50", "150", true},  {"CLK0", "60", "150", true}};
     for (const auto& c : cases) {
         SynthPage p("t2a250-4", false, "dcm_cascading", 2);
-        ASSERT_NE(p.page, nullptr);
         Tsy_Block* first = p.d.Wizard().GetActiveDCMBlk(1, false);
         first->SetAttributeValue(Tsy_Attr::TESY_ONLY_CASCADING_CLK, c.cascadingClk);
         first->SetAttributeValue(Tsy_Attr::TESY_ONLY_CLKIN_VALUE, c.firstInput);
         first->SetAttributeValue(Tsy_Attr::FIN_UNITS, "MHZ");
         p.Input("120").ByOutput(c.fout);
-        std::string what = std::string(c.cascadingClk) + " at " + c.firstInput + " -> " + c.fout;
-        EXPECT_EQ(p.EnterAndNext(), c.passes) << what;
-        EXPECT_EQ(p.OnlyError(), c.passes ? "(0 errors)" : limit) << what;
+        SCOPED_TRACE(std::string(c.cascadingClk) + " at " + c.firstInput + " -> " + c.fout);
+        EXPECT_EQ(p.EnterAndNext(), c.passes);
+        EXPECT_EQ(p.OnlyError(), c.passes ? "(0 errors)" : limit);
     }
 }
 
@@ -466,8 +435,8 @@ TEST(ClockSynthPage, NothingIsCalculatedWithoutSpeedData)
     TestDesign d("dcm", "t2a250-4", false);
     Tsy_JitterDlg page(&d.Wizard(), 1); // a wizard whose speed data never loaded
     EXPECT_FALSE(page.Calculate(true));
-    ASSERT_EQ(d.Stream().Errors().size(), 1u);
-    EXPECT_EQ(d.Stream().Errors()[0], "Unable to access speedsfile. (Bad speedsfile pointer)");
+    EXPECT_EQ(Texts(d.Stream().Errors()),
+              std::vector<std::string>{"Unable to access speedsfile. (Bad speedsfile pointer)"});
 }
 
 TEST(ClockSynthPage, MalformedEntriesAreRefusedWithAMessage)
@@ -481,13 +450,13 @@ TEST(ClockSynthPage, MalformedEntriesAreRefusedWithAMessage)
                     SynthPage p("t2a250-4", true);
                     p.ByOutput(out).Set(Tsy_Attr::TESY_ONLY_CLKIN_VALUE, in);
                     p.Set(Tsy_Attr::M_VALUE, m).Set(Tsy_Attr::D_VALUE, m).Set(Tsy_Attr::JITTER_INPUT_TYPE, type);
-                    std::string what = std::string(in) + " / " + out + " / " + m + " " + type;
+                    SCOPED_TRACE(std::string(in) + " / " + out + " / " + m + " " + type);
                     if (p.page->ApplySilently()) {
                         int cm = std::atoi(p.Get(Tsy_Attr::CLKFX_MULTIPLY).c_str());
                         int cd = std::atoi(p.Get(Tsy_Attr::CLKFX_DIVIDE).c_str());
-                        EXPECT_TRUE(cm >= 2 && cm <= 32 && cd >= 1 && cd <= 32) << what;
+                        EXPECT_TRUE(cm >= 2 && cm <= 32 && cd >= 1 && cd <= 32);
                     } else {
-                        EXPECT_FALSE(p.Errors().empty()) << what;
+                        EXPECT_FALSE(p.Errors().empty());
                     }
                 }
 }
@@ -498,34 +467,9 @@ TEST(ClockSynthPage, MalformedEntriesAreRefusedWithAMessage)
 
 namespace {
 
-struct BatchRun {
-    CommandResult result;
-    bool written = false;
-    nlohmann::json dcm; // the DCM block's attributes
-};
-
-BatchRun generate(const std::string& args)
+GenerateRun generate(const std::string& args)
 {
-    TempDir out;
-    BatchRun r;
-    r.result = RunCommand(std::string(PENDRA_BIN_DIR) + "/pendra generate --wizard dcm " + args +
-                          " --module synth -o " + out.Path());
-    std::string design = ReadTextFile(out.File("synth.tsw"));
-    r.written = !design.empty();
-    nlohmann::json file = r.written ? nlohmann::json::parse(design) : nlohmann::json::object();
-    if (r.written)
-        for (const auto& b : file["blocks"])
-            if (b["type"].get<std::string>().rfind("DCM", 0) == 0 && b["attributes"].contains("CLKFX_MULTIPLY"))
-                r.dcm = b["attributes"];
-    return r;
-}
-
-std::string attr(const BatchRun& r, const char* name)
-{
-    if (!r.dcm.contains(name))
-        return "(none)";
-    const auto& v = r.dcm[name];
-    return v.is_string() ? v.get<std::string>() : v["value"].get<std::string>();
+    return Generate("--wizard dcm " + args, "synth");
 }
 
 const std::string kWithClkfx = " --pin dcm.CLKFX=on --set dcm.TSY_CLK_OUTPUT_TYPE=DLL_AND_FX";
@@ -563,12 +507,13 @@ TEST(ClockSynthBatch, DerivesAndStoresMAndDAndTheJitter)
         {"--part t2a250-4 --set dcm.TESY_ONLY_CLKIN_VALUE=33.33", "2", "1", "2", "JITTER_VALUE", "(none)"},
     };
     for (const auto& c : cases) {
-        BatchRun r = generate(c.settings);
-        ASSERT_EQ(r.result.status, 0) << c.settings << "\n" << r.result.err;
-        EXPECT_EQ(attr(r, "CLKFX_MULTIPLY"), c.m) << c.settings;
-        EXPECT_EQ(attr(r, "CLKFX_DIVIDE"), c.d) << c.settings;
-        EXPECT_EQ(attr(r, "M_VALUE"), c.mValue) << c.settings;
-        EXPECT_EQ(attr(r, c.uiAttr), c.ui) << c.settings;
+        SCOPED_TRACE(c.settings);
+        GenerateRun r = generate(c.settings);
+        ASSERT_EQ(r.result.status, 0) << r.result.err;
+        EXPECT_EQ(r.DcmAttr("CLKFX_MULTIPLY"), c.m);
+        EXPECT_EQ(r.DcmAttr("CLKFX_DIVIDE"), c.d);
+        EXPECT_EQ(r.DcmAttr("M_VALUE"), c.mValue);
+        EXPECT_EQ(r.DcmAttr(c.uiAttr), c.ui);
     }
 }
 
@@ -593,9 +538,10 @@ TEST(ClockSynthBatch, RefusalsPrintTheMessageExitOneAndWriteNothing)
         {"--part m3e100-4 --set dcm.TESY_ONLY_CLKIN_VALUE=0.5 --set dcm.FOUT_VALUE=30" + kClkfxOnly, kNotInRange},
     };
     for (const auto& c : cases) {
-        BatchRun r = generate(c.settings);
-        EXPECT_EQ(r.result.status, 1) << c.settings << "\n" << r.result.err;
+        SCOPED_TRACE(c.settings);
+        GenerateRun r = generate(c.settings);
+        EXPECT_EQ(r.result.status, 1) << r.result.err;
         EXPECT_NE(r.result.err.find("ERROR: " + c.error + "\n"), std::string::npos) << r.result.err;
-        EXPECT_FALSE(r.written) << c.settings;
+        EXPECT_FALSE(r.Written());
     }
 }

@@ -2,6 +2,7 @@
 
 #include "wizard/Tsy_DCMwiz.h"
 
+#include <sstream>
 #include <stdexcept>
 
 void Set(Tsy_Block* block, const char* attribute, const char* value)
@@ -36,289 +37,149 @@ void Buffer(Tsy_Block* block, const char* pin, int n, const char* type, const ch
 
 namespace {
 
-Tsy_Block* dcm(Tsy_DCMwiz& w, int inst = 1)
+std::string trimmed(const std::string& s)
 {
-    Tsy_Block* b = w.GetActiveDCMBlk(inst, true);
-    if (!b)
-        throw std::runtime_error("no DCM block");
-    return b;
+    size_t from = s.find_first_not_of(' '), to = s.find_last_not_of(' ');
+    return from == std::string::npos ? "" : s.substr(from, to - from + 1);
 }
 
-// What General Setup leaves for internal feedback: the loop's output marked
-// with its feedback buffer.
-void internalFeedback(Tsy_Block* b, const char* multiple, int n = 1)
+// One step of a recipe on the current DCM block (see makeDesigns).
+void apply(Tsy_Block* const dcms[], Tsy_Block*& b, const std::string& step)
 {
-    Set(b, "FB_SOURCE", "INTERNAL");
-    Set(b, "CLK_FEEDBACK", multiple);
-    Buffer(b, std::string(multiple) == "1X" ? "CLK0" : "CLK2X", n, "BUFG", "FEEDBACK_BUF");
+    const size_t eq = step.find('='), hash = step.find('#'), dot = step.find('.');
+    const std::string key = step.substr(0, eq), value = eq == std::string::npos ? "" : step.substr(eq + 1);
+    if (step[0] == '@') {
+        b = dcms[step[1] == '2' ? 1 : 0];
+    } else if (step[0] == '+' || step[0] == '-') {
+        Use(b, step.c_str() + 1, step[0] == '+');
+    } else if (step.rfind("fb:", 0) == 0) {
+        // What General Setup leaves for internal feedback: the loop's output
+        // marked with its feedback buffer.
+        const std::string multiple = step.substr(3, 2);
+        Set(b, "FB_SOURCE", "INTERNAL");
+        Set(b, "CLK_FEEDBACK", multiple.c_str());
+        Buffer(b, multiple == "1X" ? "CLK0" : "CLK2X", hash == std::string::npos ? 1 : std::stoi(step.substr(hash + 1)),
+               "BUFG", "FEEDBACK_BUF");
+    } else if (step.rfind("ext:", 0) == 0) {
+        Set(b, "FB_SOURCE", "EXTERNAL");
+        Set(b, "TESY_ONLY_FB_EXTERNAL", step.c_str() + 4);
+    } else if (step.rfind("fwd:", 0) == 0) {
+        // What the clock forwarding and board deskew pages leave on the
+        // forwarded outputs: buffers the generator builds itself.
+        Buffer(b, key.c_str() + 4, 1, value.c_str(), "DISABLED_BUF");
+    } else if (eq == std::string::npos) {
+        throw std::runtime_error("unreadable design step '" + step + "'");
+    } else if (hash < eq) {
+        const size_t slash = value.find('/');
+        Buffer(b, key.substr(0, hash).c_str(), std::stoi(key.substr(hash + 1)), value.substr(0, slash).c_str(),
+               slash == std::string::npos ? nullptr : value.c_str() + slash + 1);
+    } else if (dot < eq) {
+        PinAttr(b, key.substr(0, dot).c_str(), key.c_str() + dot + 1, value.c_str());
+    } else {
+        Set(b, key.c_str(), value.c_str());
+    }
 }
 
-void externalFeedback(Tsy_Block* b, const char* kind)
+DcmDesign design(const char* name, const char* keyword, const char* part, const std::string& recipe)
 {
-    Set(b, "FB_SOURCE", "EXTERNAL");
-    Set(b, "TESY_ONLY_FB_EXTERNAL", kind);
+    return {name, keyword, part, [recipe](Tsy_DCMwiz& w) { ApplyRecipe(w, recipe); }};
 }
 
-// What the clock forwarding and board deskew pages leave on the forwarded
-// outputs: buffers the generator builds itself.
-void forwarded(Tsy_Block* b, const char* pin, const char* type)
-{
-    Buffer(b, pin, 1, type, "DISABLED_BUF");
-}
-
+// Recipes, step by step on the first DCM:
+//   ATTR=VALUE          an attribute, made active
+//   +PIN, -PIN          an output used or not
+//   PIN#N=TYPE[/STATE]  buffer N of a pin, with its row state
+//   PIN.ATTR=VALUE      a record on a pin
+//   fb:1X, fb:2X#N      internal feedback, its buffer as buffer N
+//   ext:KIND            external feedback, single or differential
+//   fwd:PIN=TYPE        an output the application page forwards
+//   @2                  on to the second DCM
 std::vector<DcmDesign> makeDesigns()
 {
     return {
-        {"single_default", "dcm", "t5da1-1",
-         [](Tsy_DCMwiz& w) { internalFeedback(dcm(w), "1X"); }},
-        {"single_internal_input", "dcm", "t2a250-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "CLKIN_SRC_TYPE", "INTERNAL");
-             internalFeedback(b, "1X");
-             Buffer(b, "CLK90", 1, "BUFG", "ENABLED_BUF");
-         }},
-        {"single_differential_input", "dcm", "m3e100-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "TESY_ONLY_CLKIN_EXTERNAL", "DIFFERENTIAL");
-             Use(b, "CLK0", false);
-             internalFeedback(b, "2X");
-             Buffer(b, "CLKFX", 1, "BUFGCE");
-         }},
-        {"feedback_external_single", "dcm", "t4a25-10",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             externalFeedback(b, "SINGLE");
-             Buffer(b, "CLK0", 1, "BUFG");
-         }},
-        {"feedback_external_differential", "dcm", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             externalFeedback(b, "DIFFERENTIAL");
-             Buffer(b, "CLK0", 1, "BUFG");
-             Buffer(b, "CLK90", 1, "BUFG");
-         }},
-        {"feedback_none", "dcm", "t2p7-5",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "FB_SOURCE", "NONE");
-             Set(b, "CLK_FEEDBACK", "NONE");
-             Use(b, "CLK0", false);
-             Buffer(b, "CLKFX", 1, "BUFG");
-         }},
-        {"mux_kinds", "dcm", "t4a25-10",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             internalFeedback(b, "1X");
-             Buffer(b, "CLK90", 1, "BUFGMUX");
-             PinAttr(b, "CLK90", "TSY_CLKBUF1_I1_PINNAME", "CLK270");
-             Buffer(b, "CLK180", 1, "BUFGMUX_TALDOR4");
-             PinAttr(b, "CLK180", "TSY_CLKMUX_I1", "CLKDV");
-             Buffer(b, "CLKFX", 1, "BUFGCTRL");
-             PinAttr(b, "CLKFX", "TSY_CLKBUF1_I1_PINNAME", "CLKFX180");
-             PinAttr(b, "CLKFX", "TSY_CLKBUF1_IGNORE0_PINNAME", "CLKFX");
-         }},
-        {"mux_on_feedback_clock", "dcm", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             internalFeedback(b, "1X");
-             Buffer(b, "CLK90", 1, "BUFGMUX_CTRL");
-             PinAttr(b, "CLK90", "TSY_CLKBUF1_I1_PINNAME", "CLK0");
-         }},
-        {"routing_and_output_buffers", "dcm", "m3s200-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             internalFeedback(b, "1X");
-             Buffer(b, "CLK90", 1, "LOCALROUTING");
-             Buffer(b, "CLK180", 1, "LOWSKEWLINE");
-             Buffer(b, "CLK270", 1, "OBUF");
-             Buffer(b, "CLKDV", 1, "BUFG");
-             Buffer(b, "CLKDV", 2, "LOCALROUTING");
-             Buffer(b, "CLK2X", 1, "BUFG", "DISABLED_BUF");
-         }},
-        {"second_buffer_on_feedback_clock", "dcm", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             internalFeedback(b, "1X");
-             Buffer(b, "CLK0", 2, "BUFG", "ENABLED_BUF");
-         }},
-        {"typed_signal_names", "dcm", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             internalFeedback(b, "1X");
-             Buffer(b, "CLK90", 1, "BUFGCE");
-             PinAttr(b, "CLK90", "TSY_CLKBUF1_I_SIGNAME", "fast_clk_src");
-             PinAttr(b, "CLK90", "TSY_CLKBUF1_CE_SIGNAME", "fast_clk_en");
-             PinAttr(b, "CLK90", "TSY_CLKBUF1_O_SIGNAME", "fast_clk");
-             Buffer(b, "CLKIN", 1, "BUFG");
-         }},
-        {"reset_logic_and_ports", "dcm", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             internalFeedback(b, "1X");
-             Set(b, "TESY_ONLY_RESET_LOGIC", "TRUE");
-             for (const char* p : {"PSEN", "PSINCDEC", "PSCLK", "PSDONE", "DADDR", "DI", "DWE", "DEN", "DCLK", "DO",
-                                   "DRDY"})
-                 Use(b, p);
-         }},
-        {"reset_logic_status", "dcm", "t2a250-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             internalFeedback(b, "1X");
-             Set(b, "TESY_ONLY_RESET_LOGIC", "TRUE");
-             Use(b, "STATUS");
-         }},
-        {"board_deskew_oddr", "dcm_bddeskew", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b1 = dcm(w, 1);
-             Tsy_Block* b2 = dcm(w, 2);
-             externalFeedback(b1, "SINGLE");
-             Set(b1, "TESY_ONLY_DDR_FLIPFLOP", "ODDR");
-             forwarded(b1, "CLK0", "BUFG");
-             Set(b2, "CLKIN_SRC_TYPE", "INTERNAL");
-             internalFeedback(b2, "1X");
-             Buffer(b2, "CLK90", 1, "BUFG");
-         }},
-        {"board_deskew_internal_feedback", "dcm_bddeskew", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b1 = dcm(w, 1);
-             Tsy_Block* b2 = dcm(w, 2);
-             Set(b1, "TESY_ONLY_DDR_FLIPFLOP", "None");
-             forwarded(b1, "CLK0", "OBUF");
-             internalFeedback(b1, "1X", 2);
-             Set(b2, "CLKIN_SRC_TYPE", "INTERNAL");
-             internalFeedback(b2, "1X");
-         }},
-        {"board_deskew_ofddr", "dcm_bddeskew", "t2a250-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b1 = dcm(w, 1);
-             Tsy_Block* b2 = dcm(w, 2);
-             externalFeedback(b1, "SINGLE");
-             Set(b1, "TESY_ONLY_DDR_FLIPFLOP", "OFDDRRSE");
-             Set(b1, "TESY_ONLY_DDR_C0", "CLK2X");
-             Set(b1, "TESY_ONLY_DDR_C1", "CLK2X180");
-             forwarded(b1, "CLK2X", "BUFG");
-             forwarded(b1, "CLK2X180", "BUFG");
-             Set(b2, "CLKIN_SRC_TYPE", "INTERNAL");
-             internalFeedback(b2, "2X");
-         }},
-        {"forwarding_ofddrcpe_shared_feedback", "dcm_clkfwd", "t2a250-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "TESY_ONLY_DDR_FLIPFLOP", "OFDDRCPE");
-             Set(b, "TESY_ONLY_DDR_C0", "CLK0");
-             Set(b, "TESY_ONLY_DDR_C1", "CLK180");
-             Set(b, "FB_SOURCE", "INTERNAL");
-             Set(b, "CLK_FEEDBACK", "1X");
-             forwarded(b, "CLK0", "BUFG");
-             forwarded(b, "CLK180", "BUFG");
-         }},
-        {"forwarding_ofddrtcpe_inversion", "dcm_clkfwd", "m3s200-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "TESY_ONLY_DDR_FLIPFLOP", "OFDDRTCPE");
-             Set(b, "TESY_ONLY_DDR_C0", "CLKFX");
-             Set(b, "TESY_ONLY_DDR_C1", "INVERSION");
-             internalFeedback(b, "1X");
-             forwarded(b, "CLKFX", "BUFG");
-         }},
-        {"forwarding_ofddrtrse", "dcm_clkfwd", "t2p7-5",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "TESY_ONLY_DDR_FLIPFLOP", "OFDDRTRSE");
-             Set(b, "TESY_ONLY_DDR_C0", "CLK2X");
-             Set(b, "TESY_ONLY_DDR_C1", "CLK2X180");
-             internalFeedback(b, "1X");
-             forwarded(b, "CLK2X", "BUFG");
-             forwarded(b, "CLK2X180", "BUFG");
-         }},
-        {"forwarding_oddr", "dcm_clkfwd", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "TESY_ONLY_DDR_FLIPFLOP", "ODDR");
-             Set(b, "TESY_ONLY_DDR_CLK", "CLK90");
-             Set(b, "TESY_ONLY_DDR_INIT", "1");
-             Set(b, "TESY_ONLY_DDR_EDGEMODE", "SAME");
-             Set(b, "TESY_ONLY_DDR_RESETTYPE", "SYNCHRONOUS");
-             internalFeedback(b, "1X");
-             forwarded(b, "CLK90", "BUFG");
-         }},
-        {"forwarding_oddr_shared_feedback", "dcm_clkfwd", "t4a25-10",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "TESY_ONLY_DDR_FLIPFLOP", "ODDR");
-             Set(b, "TESY_ONLY_DDR_CLK", "CLK0");
-             Set(b, "FB_SOURCE", "INTERNAL");
-             Set(b, "CLK_FEEDBACK", "1X");
-             forwarded(b, "CLK0", "BUFG");
-         }},
-        {"forwarding_output_buffer", "dcm_clkfwd", "t2a250-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b = dcm(w);
-             Set(b, "TESY_ONLY_DDR_FLIPFLOP", "None");
-             Set(b, "TESY_ONLY_DDR_C0", "CLK0");
-             Set(b, "TESY_ONLY_DDR_C1", "INVERSION");
-             forwarded(b, "CLK0", "OBUF");
-             internalFeedback(b, "1X", 2);
-         }},
-        {"switching_bufgmux", "dcm_clkswitch", "t2a250-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b1 = dcm(w, 1);
-             Tsy_Block* b2 = dcm(w, 2);
-             Set(b1, "TESY_ONLY_DCM_SWITCHING_CLK", "CLK0");
-             internalFeedback(b1, "1X");
-             Buffer(b1, "CLK0", 2, "BUFGMUX", "DISABLED_BUF");
-             PinAttr(b1, "CLK0", "TSY_CLKMUX_I1", "CLK90 From INST2");
-             Set(b2, "TESY_ONLY_DCM_SWITCHING_CLK", "CLK90");
-             internalFeedback(b2, "1X");
-             Buffer(b2, "CLK90", 1, "BUFGMUX", "DISABLED_BUF");
-             PinAttr(b2, "CLK90", "TSY_CLKMUX_I0", "CLK0 From INST1");
-         }},
-        {"switching_bufgctrl", "dcm_clkswitch", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b1 = dcm(w, 1);
-             Tsy_Block* b2 = dcm(w, 2);
-             Set(b1, "TESY_ONLY_DCM_SWITCHING_CLK", "CLKFX");
-             Set(b1, "FB_SOURCE", "NONE");
-             Set(b1, "CLK_FEEDBACK", "NONE");
-             Use(b1, "CLK0", false);
-             Buffer(b1, "CLKFX", 1, "BUFGCTRL", "DISABLED_BUF");
-             PinAttr(b1, "CLKFX", "TSY_CLKMUX_I1", "CLK0 From INST2");
-             Set(b2, "TESY_ONLY_DCM_SWITCHING_CLK", "CLK0");
-             internalFeedback(b2, "1X");
-             Buffer(b2, "CLK0", 2, "BUFGCTRL", "DISABLED_BUF");
-             PinAttr(b2, "CLK0", "TSY_CLKMUX_I0", "CLKFX From INST1");
-         }},
-        {"cascading_clkdv", "dcm_cascading", "t5da1-1",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b1 = dcm(w, 1);
-             Tsy_Block* b2 = dcm(w, 2);
-             Set(b1, "TESY_ONLY_CASCADING_CLK", "CLKDV");
-             Set(b1, "TESY_ONLY_RESET_LOGIC", "TRUE");
-             internalFeedback(b1, "1X");
-             forwarded(b1, "CLKDV", "BUFG");
-             Set(b2, "CLKIN_SRC_TYPE", "INTERNAL");
-             internalFeedback(b2, "1X");
-             Buffer(b2, "CLKFX", 1, "BUFG");
-             Use(b2, "DO");
-         }},
-        {"cascading_clk0_shared_feedback", "dcm_cascading", "t2a250-4",
-         [](Tsy_DCMwiz& w) {
-             Tsy_Block* b1 = dcm(w, 1);
-             Tsy_Block* b2 = dcm(w, 2);
-             Set(b1, "TESY_ONLY_CASCADING_CLK", "CLK0");
-             Set(b1, "FB_SOURCE", "INTERNAL");
-             Set(b1, "CLK_FEEDBACK", "1X");
-             forwarded(b1, "CLK0", "BUFG");
-             Set(b2, "CLKIN_SRC_TYPE", "INTERNAL");
-             Set(b2, "TESY_ONLY_RESET_LOGIC", "TRUE");
-             internalFeedback(b2, "1X");
-         }},
+        design("single_default", "dcm", "t5da1-1", "fb:1X"),
+        design("single_internal_input", "dcm", "t2a250-4", "CLKIN_SRC_TYPE=INTERNAL; fb:1X; CLK90#1=BUFG/ENABLED_BUF"),
+        design("single_differential_input", "dcm", "m3e100-4",
+               "TESY_ONLY_CLKIN_EXTERNAL=DIFFERENTIAL; -CLK0; fb:2X; CLKFX#1=BUFGCE"),
+        design("feedback_external_single", "dcm", "t4a25-10", "ext:SINGLE; CLK0#1=BUFG"),
+        design("feedback_external_differential", "dcm", "t5da1-1", "ext:DIFFERENTIAL; CLK0#1=BUFG; CLK90#1=BUFG"),
+        design("feedback_none", "dcm", "t2p7-5", "FB_SOURCE=NONE; CLK_FEEDBACK=NONE; -CLK0; CLKFX#1=BUFG"),
+        design("mux_kinds", "dcm", "t4a25-10",
+               "fb:1X; CLK90#1=BUFGMUX; CLK90.TSY_CLKBUF1_I1_PINNAME=CLK270; CLK180#1=BUFGMUX_TALDOR4; "
+               "CLK180.TSY_CLKMUX_I1=CLKDV; CLKFX#1=BUFGCTRL; CLKFX.TSY_CLKBUF1_I1_PINNAME=CLKFX180; "
+               "CLKFX.TSY_CLKBUF1_IGNORE0_PINNAME=CLKFX"),
+        design("mux_on_feedback_clock", "dcm", "t5da1-1",
+               "fb:1X; CLK90#1=BUFGMUX_CTRL; CLK90.TSY_CLKBUF1_I1_PINNAME=CLK0"),
+        design("routing_and_output_buffers", "dcm", "m3s200-4",
+               "fb:1X; CLK90#1=LOCALROUTING; CLK180#1=LOWSKEWLINE; CLK270#1=OBUF; CLKDV#1=BUFG; CLKDV#2=LOCALROUTING; "
+               "CLK2X#1=BUFG/DISABLED_BUF"),
+        design("second_buffer_on_feedback_clock", "dcm", "t5da1-1", "fb:1X; CLK0#2=BUFG/ENABLED_BUF"),
+        design("typed_signal_names", "dcm", "t5da1-1",
+               "fb:1X; CLK90#1=BUFGCE; CLK90.TSY_CLKBUF1_I_SIGNAME=fast_clk_src; "
+               "CLK90.TSY_CLKBUF1_CE_SIGNAME=fast_clk_en; CLK90.TSY_CLKBUF1_O_SIGNAME=fast_clk; CLKIN#1=BUFG"),
+        design("reset_logic_and_ports", "dcm", "t5da1-1",
+               "fb:1X; TESY_ONLY_RESET_LOGIC=TRUE; +PSEN; +PSINCDEC; +PSCLK; +PSDONE; +DADDR; +DI; +DWE; +DEN; +DCLK; "
+               "+DO; +DRDY"),
+        design("reset_logic_status", "dcm", "t2a250-4", "fb:1X; TESY_ONLY_RESET_LOGIC=TRUE; +STATUS"),
+        design("board_deskew_oddr", "dcm_bddeskew", "t5da1-1",
+               "ext:SINGLE; TESY_ONLY_DDR_FLIPFLOP=ODDR; fwd:CLK0=BUFG; @2; CLKIN_SRC_TYPE=INTERNAL; fb:1X; "
+               "CLK90#1=BUFG"),
+        design("board_deskew_internal_feedback", "dcm_bddeskew", "t5da1-1",
+               "TESY_ONLY_DDR_FLIPFLOP=None; fwd:CLK0=OBUF; fb:1X#2; @2; CLKIN_SRC_TYPE=INTERNAL; fb:1X"),
+        design("board_deskew_ofddr", "dcm_bddeskew", "t2a250-4",
+               "ext:SINGLE; TESY_ONLY_DDR_FLIPFLOP=OFDDRRSE; TESY_ONLY_DDR_C0=CLK2X; TESY_ONLY_DDR_C1=CLK2X180; "
+               "fwd:CLK2X=BUFG; fwd:CLK2X180=BUFG; @2; CLKIN_SRC_TYPE=INTERNAL; fb:2X"),
+        design("forwarding_ofddrcpe_shared_feedback", "dcm_clkfwd", "t2a250-4",
+               "TESY_ONLY_DDR_FLIPFLOP=OFDDRCPE; TESY_ONLY_DDR_C0=CLK0; TESY_ONLY_DDR_C1=CLK180; FB_SOURCE=INTERNAL; "
+               "CLK_FEEDBACK=1X; fwd:CLK0=BUFG; fwd:CLK180=BUFG"),
+        design("forwarding_ofddrtcpe_inversion", "dcm_clkfwd", "m3s200-4",
+               "TESY_ONLY_DDR_FLIPFLOP=OFDDRTCPE; TESY_ONLY_DDR_C0=CLKFX; TESY_ONLY_DDR_C1=INVERSION; fb:1X; "
+               "fwd:CLKFX=BUFG"),
+        design("forwarding_ofddrtrse", "dcm_clkfwd", "t2p7-5",
+               "TESY_ONLY_DDR_FLIPFLOP=OFDDRTRSE; TESY_ONLY_DDR_C0=CLK2X; TESY_ONLY_DDR_C1=CLK2X180; fb:1X; "
+               "fwd:CLK2X=BUFG; fwd:CLK2X180=BUFG"),
+        design("forwarding_oddr", "dcm_clkfwd", "t5da1-1",
+               "TESY_ONLY_DDR_FLIPFLOP=ODDR; TESY_ONLY_DDR_CLK=CLK90; TESY_ONLY_DDR_INIT=1; TESY_ONLY_DDR_EDGEMODE=SAME; "
+               "TESY_ONLY_DDR_RESETTYPE=SYNCHRONOUS; fb:1X; fwd:CLK90=BUFG"),
+        design("forwarding_oddr_shared_feedback", "dcm_clkfwd", "t4a25-10",
+               "TESY_ONLY_DDR_FLIPFLOP=ODDR; TESY_ONLY_DDR_CLK=CLK0; FB_SOURCE=INTERNAL; CLK_FEEDBACK=1X; "
+               "fwd:CLK0=BUFG"),
+        design("forwarding_output_buffer", "dcm_clkfwd", "t2a250-4",
+               "TESY_ONLY_DDR_FLIPFLOP=None; TESY_ONLY_DDR_C0=CLK0; TESY_ONLY_DDR_C1=INVERSION; fwd:CLK0=OBUF; "
+               "fb:1X#2"),
+        design("switching_bufgmux", "dcm_clkswitch", "t2a250-4",
+               "TESY_ONLY_DCM_SWITCHING_CLK=CLK0; fb:1X; CLK0#2=BUFGMUX/DISABLED_BUF; "
+               "CLK0.TSY_CLKMUX_I1=CLK90 From INST2; @2; TESY_ONLY_DCM_SWITCHING_CLK=CLK90; fb:1X; "
+               "CLK90#1=BUFGMUX/DISABLED_BUF; CLK90.TSY_CLKMUX_I0=CLK0 From INST1"),
+        design("switching_bufgctrl", "dcm_clkswitch", "t5da1-1",
+               "TESY_ONLY_DCM_SWITCHING_CLK=CLKFX; FB_SOURCE=NONE; CLK_FEEDBACK=NONE; -CLK0; "
+               "CLKFX#1=BUFGCTRL/DISABLED_BUF; CLKFX.TSY_CLKMUX_I1=CLK0 From INST2; @2; "
+               "TESY_ONLY_DCM_SWITCHING_CLK=CLK0; fb:1X; CLK0#2=BUFGCTRL/DISABLED_BUF; "
+               "CLK0.TSY_CLKMUX_I0=CLKFX From INST1"),
+        design("cascading_clkdv", "dcm_cascading", "t5da1-1",
+               "TESY_ONLY_CASCADING_CLK=CLKDV; TESY_ONLY_RESET_LOGIC=TRUE; fb:1X; fwd:CLKDV=BUFG; @2; "
+               "CLKIN_SRC_TYPE=INTERNAL; fb:1X; CLKFX#1=BUFG; +DO"),
+        design("cascading_clk0_shared_feedback", "dcm_cascading", "t2a250-4",
+               "TESY_ONLY_CASCADING_CLK=CLK0; FB_SOURCE=INTERNAL; CLK_FEEDBACK=1X; fwd:CLK0=BUFG; @2; "
+               "CLKIN_SRC_TYPE=INTERNAL; TESY_ONLY_RESET_LOGIC=TRUE; fb:1X"),
     };
 }
 
 } // namespace
+
+void ApplyRecipe(Tsy_DCMwiz& w, const std::string& recipe)
+{
+    // Both DCMs are taken before either is edited, as the pages find them.
+    Tsy_Block* const dcms[] = {w.GetActiveDCMBlk(1, true),
+                               recipe.find("@2") == std::string::npos ? nullptr : w.GetActiveDCMBlk(2, true)};
+    Tsy_Block* b = dcms[0];
+    std::istringstream steps(recipe);
+    for (std::string step; std::getline(steps, step, ';');) {
+        if (!b)
+            throw std::runtime_error("no DCM block");
+        apply(dcms, b, trimmed(step));
+    }
+}
 
 const std::vector<DcmDesign>& DcmDesigns()
 {

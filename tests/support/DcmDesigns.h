@@ -21,6 +21,8 @@ struct DcmDesign {
 };
 
 const std::vector<DcmDesign>& DcmDesigns();
+// Edits the DCMs as a design's recipe says (see DcmDesigns.cpp).
+void ApplyRecipe(Tsy_DCMwiz& wizard, const std::string& recipe);
 
 // Editing blocks as the pages do.
 void Set(Tsy_Block* block, const char* attribute, const char* value);

@@ -5,6 +5,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <fstream>
@@ -47,6 +48,19 @@ void TestDesign::MarkLoaded()
 void TestDesign::Instantiate()
 {
     wizard_->InstantiatePages();
+}
+
+std::vector<std::string> Texts(const std::vector<StringBase>& messages)
+{
+    std::vector<std::string> out;
+    for (const auto& m : messages)
+        out.push_back(m.str());
+    return out;
+}
+
+bool Contains(const std::vector<std::string>& texts, const std::string& text)
+{
+    return std::find(texts.begin(), texts.end(), text) != texts.end();
 }
 
 std::string ReadTextFile(const std::string& path)

@@ -12,6 +12,7 @@
 #include <functional>
 #include <memory>
 #include <string>
+#include <vector>
 
 class TestDesign {
 public:
@@ -37,6 +38,20 @@ private:
     std::unique_ptr<Tsy_WizData> data_;
     std::unique_ptr<Tsy_DCMwiz> wizard_;
 };
+
+// The wizard's page of that kind serving DCM instance inst; null when none.
+template <typename Page>
+Page* FindPage(Tsy_DCMwiz& wizard, int inst = 1)
+{
+    for (int i = 0; i < Tsy_WizMain::kPageSlots; ++i)
+        if (auto* p = dynamic_cast<Page*>(wizard.GetPage(i)); p && p->GetInstNum() == inst)
+            return p;
+    return nullptr;
+}
+
+// Messages as plain strings, for comparing whole lists.
+std::vector<std::string> Texts(const std::vector<StringBase>& messages);
+bool Contains(const std::vector<std::string>& texts, const std::string& text);
 
 // Reads a whole file; empty when it cannot.
 std::string ReadTextFile(const std::string& path);
