@@ -152,18 +152,55 @@ int Tsy_HostSession::Prepare(const Tsy_RunOptions& options, std::string& error)
     return kOk;
 }
 
-bool Tsy_HostSession::checkOptions(const Tsy_RunOptions& o, std::string& error)
+namespace {
+
+// Empty when the module name may be written as both a Verilog module and a
+// VHDL entity, else why not.
+std::string moduleNameProblem(const std::string& module)
 {
-    wizards_ = Tsy_WizardCatalog::LoadFile(Tsy_DataFile("wizards.json"));
+    std::string problem = Tsy_HdlNameProblem(module);
+    if (!problem.empty())
+        return "not a legal Verilog and VHDL name: it " + problem;
+    // The module would clash with the primitives it instantiates (VHDL
+    // names ignore case).
+    for (const auto& type : Tsy_PrimitiveLibrary::Instance().Types())
+        if (StringBase(type).EqualsNoCase(module))
+            return "the name of a library primitive; choose another module name";
+    return std::string();
+}
+
+bool checkSettingsShape(const Tsy_RunOptions& o, std::string& error)
+{
+    Tsy_Setting s;
+    for (const auto& text : o.sets)
+        if (!Tsy_ParseSetting(text, false, s, error)) {
+            error = "--set " + error;
+            return false;
+        }
+    for (const auto& text : o.pins)
+        if (!Tsy_ParseSetting(text, true, s, error)) {
+            error = "--pin " + error;
+            return false;
+        }
+    return true;
+}
+
+} // namespace
+
+// Options win over what the design file says; the module name falls back to
+// the file's, then to the default.
+bool Tsy_HostSession::readDesignHeader(const Tsy_RunOptions& o, std::string& error)
+{
     Tsy_DesignHeader header;
     if (!o.designFile.empty()) {
         header = Tsy_DesignFile::ReadHeader(o.designFile);
         loadedVersion_ = header.version.str();
+        Tsy_PartInfo loaded;
+        loadedFamily_ = Tsy_DeviceCatalog::Instance().FindPart(header.part.str(), loaded) ? loaded.family->key : "";
     }
     wizardKey_ = o.wizard.empty() ? header.wizard.str() : o.wizard;
     part_ = o.part.empty() ? header.part.str() : o.part;
     module_ = !o.module.empty() ? o.module : !header.module.IsEmpty() ? header.module.str() : kDefaultModule;
-
     if (!o.designFile.empty() && !o.wizard.empty() && !lowerEquals(o.wizard, header.wizard.str())) {
         error = "--wizard " + o.wizard + ": " + o.designFile + " is a '" + header.wizard.str() + "' design";
         return false;
@@ -172,6 +209,11 @@ bool Tsy_HostSession::checkOptions(const Tsy_RunOptions& o, std::string& error)
         error = "give a design file, or both --wizard and --part";
         return false;
     }
+    return true;
+}
+
+bool Tsy_HostSession::checkWizardAndPart(std::string& error)
+{
     const Tsy_WizardInfo* info = wizards_->Find(wizardKey_);
     if (!info) {
         error = "--wizard " + wizardKey_ + ": unknown wizard type (see 'pendra wizards')";
@@ -190,37 +232,20 @@ bool Tsy_HostSession::checkOptions(const Tsy_RunOptions& o, std::string& error)
                 " cannot build it (it has no " + missing + ")";
         return false;
     }
-    std::string problem = Tsy_HdlNameProblem(module_);
+    return true;
+}
+
+bool Tsy_HostSession::checkOptions(const Tsy_RunOptions& o, std::string& error)
+{
+    wizards_ = Tsy_WizardCatalog::LoadFile(Tsy_DataFile("wizards.json"));
+    if (!readDesignHeader(o, error) || !checkWizardAndPart(error))
+        return false;
+    std::string problem = moduleNameProblem(module_);
     if (!problem.empty()) {
-        error = "--module " + module_ + ": not a legal Verilog and VHDL name: it " + problem;
+        error = "--module " + module_ + ": " + problem;
         return false;
     }
-    // The module would clash with the primitives it instantiates (VHDL
-    // names ignore case).
-    for (const auto& type : Tsy_PrimitiveLibrary::Instance().Types())
-        if (StringBase(type).EqualsNoCase(module_)) {
-            error = "--module " + module_ + ": the name of a library primitive; choose another module name";
-            return false;
-        }
-    Tsy_Setting s;
-    for (const auto& text : o.sets)
-        if (!Tsy_ParseSetting(text, false, s, error)) {
-            error = "--set " + error;
-            return false;
-        }
-    for (const auto& text : o.pins)
-        if (!Tsy_ParseSetting(text, true, s, error)) {
-            error = "--pin " + error;
-            return false;
-        }
-    if (!o.designFile.empty()) {
-        Tsy_PartInfo loaded;
-        if (Tsy_DeviceCatalog::Instance().FindPart(header.part.str(), loaded))
-            loadedFamily_ = loaded.family->key;
-        else
-            loadedFamily_ = "";
-    }
-    return true;
+    return checkSettingsShape(o, error);
 }
 
 bool Tsy_HostSession::makeDatabase(std::string&)

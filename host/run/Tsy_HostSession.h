@@ -52,6 +52,8 @@ public:
 
 private:
     bool checkOptions(const Tsy_RunOptions& options, std::string& error);
+    bool readDesignHeader(const Tsy_RunOptions& options, std::string& error);
+    bool checkWizardAndPart(std::string& error);
     bool makeDatabase(std::string& error);
     bool makeWizard(std::string& error);
     bool applySettings();
