@@ -195,67 +195,85 @@ bool Tsy_DesignGen::GenerateDCMDesign()
 {
     failed_ = false;
     const bool twoDcms = !Tsy_DCMwiz::IsSingleDcmType(wizType_);
-    const int k1 = twoDcms ? 1 : 0;
-    Port::Stream* stream = wizard_->GetStream();
-    auto lookup = [&](int inst) {
-        int before = stream ? stream->ErrorCount() : 0;
-        Tsy_Block* b = wizard_->GetActiveDCMBlk(inst, true);
-        // The lookup names a missing primitive itself; a copy it could not
-        // make it leaves unsaid.
-        if (!b && (!stream || stream->ErrorCount() == before))
-            Report("DCM block not found.");
-        return b;
-    };
+    RetireGeneratedBlocks();
+    // Without its DCMs there is no design to write: a Finish that built
+    // half a netlist must not pass for one that succeeded.
+    if (!FindDcmBlocks(twoDcms))
+        return false;
+    StringBase pmcd = dcm1_->GetAttributeValue(Tsy_Attr::TESY_ONLY_PMCD);
+    const bool pmcdUse = !pmcd.IsEmpty() && !is(pmcd, "NONE");
 
-    // The netlist of an earlier Finish is built anew.
+    data_->SetAllSigsIsActive(false);
+    Prepare();
+    dcm1_->ClearAllPinSignals();
+    BuildFirstDcm(twoDcms ? 1 : 0, pmcdUse);
+    if (dcm2_)
+        BuildSecondDcm();
+    return !failed_;
+}
+
+// The netlist of an earlier Finish is built anew.
+void Tsy_DesignGen::RetireGeneratedBlocks()
+{
     for (const auto& b : data_->Blocks())
         if (b->IsGenerated())
             b->active = false;
+}
 
-    dcm1_ = lookup(1);
+Tsy_Block* Tsy_DesignGen::FindDcmBlock(int inst)
+{
+    Port::Stream* stream = wizard_->GetStream();
+    int before = stream ? stream->ErrorCount() : 0;
+    Tsy_Block* b = wizard_->GetActiveDCMBlk(inst, true);
+    // The lookup names a missing primitive itself; a copy it could not
+    // make it leaves unsaid.
+    if (!b && (!stream || stream->ErrorCount() == before))
+        Report("DCM block not found.");
+    return b;
+}
+
+// Finds the design's DCMs and marks them active; false when one is missing.
+bool Tsy_DesignGen::FindDcmBlocks(bool twoDcms)
+{
+    dcm1_ = FindDcmBlock(1);
     dcm2_ = nullptr;
     if (twoDcms) {
-        dcm2_ = lookup(2);
+        dcm2_ = FindDcmBlock(2);
         if (dcm2_)
             dcm2_->ClearAllPinSignals();
     }
-    // Without its DCMs there is no design to write: a Finish that built
-    // half a netlist must not pass for one that succeeded.
     if (!dcm1_ || (twoDcms && !dcm2_))
         return false;
     dcm1_->active = true;
     if (dcm2_)
         dcm2_->active = true;
+    return true;
+}
 
-    StringBase pmcd = dcm1_->GetAttributeValue(Tsy_Attr::TESY_ONLY_PMCD);
-    const bool pmcdUse = !pmcd.IsEmpty() && !is(pmcd, "NONE");
-
-    data_->SetAllSigsIsActive(false);
-
-    Prepare();
-    dcm1_->ClearAllPinSignals();
-    InputClock(dcm1_, k1);
+void Tsy_DesignGen::BuildFirstDcm(int k, bool pmcdUse)
+{
+    InputClock(dcm1_, k);
     if (!pmcdUse)
-        Feedback(dcm1_, k1, true);
-    ApplicationLogic(dcm1_, dcm2_, k1);
+        Feedback(dcm1_, k, true);
+    ApplicationLogic(dcm1_, dcm2_, k);
     if (pmcdUse)
-        PmcdPath(dcm1_, k1);
+        PmcdPath(dcm1_, k);
     else
-        OutputBuffers(dcm1_, k1);
-    ResetLogic(dcm1_, k1, nullptr);
-    RemainingDcmPins(dcm1_, k1);
+        OutputBuffers(dcm1_, k);
+    ResetLogic(dcm1_, k, nullptr);
+    RemainingDcmPins(dcm1_, k);
     if (pmcdUse)
-        PmcdConnections(dcm1_, k1);
+        PmcdConnections(dcm1_, k);
+}
 
-    if (dcm2_) {
-        InputClock(dcm2_, 2);
-        Feedback(dcm2_, 2, true);
-        ApplicationLogic(dcm1_, dcm2_, 2);
-        OutputBuffers(dcm2_, 2);
-        ResetLogic(dcm2_, 2, dcm1_);
-        RemainingDcmPins(dcm2_, 2);
-    }
-    return !failed_;
+void Tsy_DesignGen::BuildSecondDcm()
+{
+    InputClock(dcm2_, 2);
+    Feedback(dcm2_, 2, true);
+    ApplicationLogic(dcm1_, dcm2_, 2);
+    OutputBuffers(dcm2_, 2);
+    ResetLogic(dcm2_, 2, dcm1_);
+    RemainingDcmPins(dcm2_, 2);
 }
 
 // The PLL designs arrive with the PLL pages; until then their wizard types

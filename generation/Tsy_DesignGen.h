@@ -95,6 +95,11 @@ private:
     StringBase RecordedOr(const Tsy_Pin* pin, int n, const char* port, const StringBase& fallback);
 
     // Steps of the DCM design.
+    void RetireGeneratedBlocks();
+    Tsy_Block* FindDcmBlock(int inst);
+    bool FindDcmBlocks(bool twoDcms);
+    void BuildFirstDcm(int k, bool pmcdUse);
+    void BuildSecondDcm();
     bool SharesFeedbackWithApplication(const Tsy_Block* block, int k) const;
     StringBase ForwardedOutput(const Tsy_Block* block) const;
     void OutputBuffer(Tsy_Pin* source, int k, int n);
@@ -107,6 +112,16 @@ private:
                   Tsy_Pin* i1, const StringBase& i1Net, const MuxPorts& ports);
     Tsy_Pin* ResolveMuxInput(Tsy_Block* block, const StringBase& text);
     void ClockForwarding(Tsy_Block* block, int k);
+    // The DDR output flip-flops that can forward a clock;
+    // ForwardingFlopNamed gives null for any other type.
+    struct ForwardingFlop;
+    static const ForwardingFlop* ForwardingFlopNamed(const StringBase& type);
+    Tsy_Block* ForwardingFlipFlop(const ForwardingFlop& kind, const StringBase& fwd, int k);
+    void SetOddrAttributes(const Tsy_Block* block, Tsy_Block* flop);
+    void ForwardingClocks(Tsy_Block* block, Tsy_Block* flop, const ForwardingFlop& kind, Tsy_Pin* source,
+                          const StringBase& fwd, int k);
+    void ForwardingSecondClock(Tsy_Block* block, Tsy_Block* flop, const StringBase& clock, const StringBase& fwd,
+                               int k);
     void Cascading(Tsy_Block* dcm1, Tsy_Block* dcm2);
     void ClockSwitching(Tsy_Block* dcm1, Tsy_Block* dcm2);
     StringBase LockedInverter(Tsy_Block* partner, int k);

@@ -16,8 +16,6 @@ bool is(const StringBase& value, const char* word)
     return value.EqualsNoCase(word);
 }
 
-const char* const kFlipFlops[] = {"ODDR", "OFDDRCPE", "OFDDRRSE", "OFDDRTCPE", "OFDDRTRSE"};
-
 // The logical page of that kind in the wizard's page slots, or null.
 Tsy_WizPage* pageOfKind(Tsy_DCMwiz* wizard, Tsy_PageKind kind)
 {
@@ -45,6 +43,29 @@ void Tsy_DesignGen::ApplicationLogic(Tsy_Block* dcm1, Tsy_Block* dcm2, int k)
         ClockSwitching(dcm1, dcm2);
 }
 
+// The tristate kinds have T and drive O, the others Q; the CPE kinds have
+// PRE and CLR, the RSE kinds S and R.
+struct Tsy_DesignGen::ForwardingFlop {
+    const char* type;
+    bool tristate;
+    bool presetClear;
+
+    // ODDR takes one clock and D1/D2; the others two clocks and D0/D1.
+    bool IsOddr() const { return StringBase(type) == "ODDR"; }
+};
+
+const Tsy_DesignGen::ForwardingFlop* Tsy_DesignGen::ForwardingFlopNamed(const StringBase& type)
+{
+    static const ForwardingFlop kinds[] = {
+        {"ODDR", false, false},     {"OFDDRCPE", false, true}, {"OFDDRRSE", false, false},
+        {"OFDDRTCPE", true, true}, {"OFDDRTRSE", true, false},
+    };
+    for (const auto& kind : kinds)
+        if (is(type, kind.type))
+            return &kind;
+    return nullptr;
+}
+
 void Tsy_DesignGen::ClockForwarding(Tsy_Block* block, int k)
 {
     if (!block)
@@ -59,47 +80,70 @@ void Tsy_DesignGen::ClockForwarding(Tsy_Block* block, int k)
         OutputBuffer(source, k, 0);
         return;
     }
-    const char* kind = nullptr;
-    for (const char* known : kFlipFlops)
-        if (is(ff, known))
-            kind = known;
+    const ForwardingFlop* kind = ForwardingFlopNamed(ff);
     if (!kind) {
         Report(StringBase::Printf("The forwarding flip-flop '%s' is not one the wizard can build.", ff.c_str()));
         return;
     }
-    const StringBase kindName = kind;
-    const bool oddr = kindName == "ODDR";
-    const bool tristate = kindName == "OFDDRTCPE" || kindName == "OFDDRTRSE";
-    const bool presetClear = kindName == "OFDDRCPE" || kindName == "OFDDRTCPE";
-    Tsy_Block* flop = NewBlock(StringBase::Printf("%s_INST", kind), kind);
+    Tsy_Block* flop = ForwardingFlipFlop(*kind, fwd, k);
     if (!flop)
         return;
+    if (kind->IsOddr())
+        SetOddrAttributes(block, flop);
+    ForwardingClocks(block, flop, *kind, source, fwd, k);
+}
+
+// The flip-flop with its data, control and output pins wired; its clocks
+// are left to the caller.
+Tsy_Block* Tsy_DesignGen::ForwardingFlipFlop(const ForwardingFlop& kind, const StringBase& fwd, int k)
+{
+    const bool oddr = kind.IsOddr();
+    Tsy_Block* flop = NewBlock(StringBase::Printf("%s_INST", kind.type), kind.type);
+    if (!flop)
+        return nullptr;
     // A flip-flop that sends 1 on one edge and 0 on the other repeats its
     // clock on the pin, with the output delay of every other DDR output.
     Tie(Pin(flop, oddr ? "D1" : "D0", true), true);
     Tie(Pin(flop, oddr ? "D2" : "D1", true), false);
     Connect(Pin(flop, "CE", true), InputPort(P("CE_IN", k)));
-    for (const char* pin : {presetClear ? "PRE" : "S", presetClear ? "CLR" : "R"})
+    for (const char* pin : {kind.presetClear ? "PRE" : "S", kind.presetClear ? "CLR" : "R"})
         Connect(Pin(flop, pin, true), InputPort(P(StringBase::Printf("%s_IN", pin), k)));
-    if (tristate)
+    if (kind.tristate)
         Connect(Pin(flop, "T", true), InputPort(P("T_IN", k)));
-    Connect(Pin(flop, tristate ? "O" : "Q", false), OutputPort(StringBase::Printf("DDR_%s_OUT", fwd.c_str())));
-    if (oddr) {
-        StringBase init = block->GetAttributeValue(Tsy_Attr::TESY_ONLY_DDR_INIT);
-        flop->AddAttribute(Tsy_Attr::INIT, init.IsEmpty() ? StringBase("0") : init);
-        flop->AddAttribute(Tsy_Attr::DDR_CLK_EDGE,
-                           is(block->GetAttributeValue(Tsy_Attr::TESY_ONLY_DDR_EDGEMODE), "SAME") ? "SAME_EDGE"
-                                                                                                  : "OPPOSITE_EDGE");
-        flop->AddAttribute(Tsy_Attr::SRTYPE,
-                           is(block->GetAttributeValue(Tsy_Attr::TESY_ONLY_DDR_RESETTYPE), "SYNCHRONOUS") ? "SYNC"
-                                                                                                        : "ASYNC");
-    }
-    Tsy_Pin* c0 = Pin(flop, oddr ? "C" : "C0", true);
+    Connect(Pin(flop, kind.tristate ? "O" : "Q", false), OutputPort(StringBase::Printf("DDR_%s_OUT", fwd.c_str())));
+    return flop;
+}
+
+void Tsy_DesignGen::SetOddrAttributes(const Tsy_Block* block, Tsy_Block* flop)
+{
+    StringBase init = block->GetAttributeValue(Tsy_Attr::TESY_ONLY_DDR_INIT);
+    flop->AddAttribute(Tsy_Attr::INIT, init.IsEmpty() ? StringBase("0") : init);
+    flop->AddAttribute(Tsy_Attr::DDR_CLK_EDGE,
+                       is(block->GetAttributeValue(Tsy_Attr::TESY_ONLY_DDR_EDGEMODE), "SAME") ? "SAME_EDGE"
+                                                                                              : "OPPOSITE_EDGE");
+    flop->AddAttribute(Tsy_Attr::SRTYPE,
+                       is(block->GetAttributeValue(Tsy_Attr::TESY_ONLY_DDR_RESETTYPE), "SYNCHRONOUS") ? "SYNC"
+                                                                                                    : "ASYNC");
+}
+
+// The forwarded output reaches the flip-flop's clock through a global
+// buffer, which may close the DCM's feedback loop as well.
+void Tsy_DesignGen::ForwardingClocks(Tsy_Block* block, Tsy_Block* flop, const ForwardingFlop& kind, Tsy_Pin* source,
+                                     const StringBase& fwd, int k)
+{
+    Tsy_Pin* c0 = Pin(flop, kind.IsOddr() ? "C" : "C0", true);
     StringBase clock = GlobalBuffer(source, c0, k, 20, false, true, k);
     if (SharesFeedbackWithApplication(block, k))
         Connect(block->GetNamedPin("CLKFB"), clock);
-    if (oddr)
-        return;
+    if (!kind.IsOddr())
+        ForwardingSecondClock(block, flop, clock, fwd, k);
+}
+
+// C1 of the two-clock flip-flops: the forwarded clock inverted, or another
+// output of the DCM through a global buffer of its own.
+void Tsy_DesignGen::ForwardingSecondClock(Tsy_Block* block, Tsy_Block* flop, const StringBase& clock,
+                                          const StringBase& fwd, int k)
+{
     Tsy_Pin* c1 = Pin(flop, "C1", true);
     StringBase second = block->GetAttributeValue(Tsy_Attr::TESY_ONLY_DDR_C1);
     second.Trim();

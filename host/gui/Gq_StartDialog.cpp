@@ -32,6 +32,23 @@ QLabel* makeNote(QWidget* parent, const char* name)
     return note;
 }
 
+QLabel* buddyLabel(QWidget* parent, const char* text, QWidget* buddy)
+{
+    auto* label = new QLabel(text, parent);
+    label->setBuddy(buddy);
+    return label;
+}
+
+// Completes on a match anywhere in a word, in any case.
+QCompleter* anywhereCompleter(const QStringList& words, QObject* parent)
+{
+    auto* completer = new QCompleter(words, parent);
+    completer->setCaseSensitivity(Qt::CaseInsensitive);
+    completer->setFilterMode(Qt::MatchContains);
+    completer->setCompletionMode(QCompleter::PopupCompletion);
+    return completer;
+}
+
 void showNote(QLabel* note, const QString& text)
 {
     note->setText(text);
@@ -45,7 +62,18 @@ Gq_StartDialog::Gq_StartDialog(const Tsy_WizardCatalog& wizards, const Tsy_Devic
 {
     setObjectName("StartDialog");
     setWindowTitle("Corvane Pendra - New Design");
+    makeWizardChoice();
+    makePartChoice();
+    makeModuleField();
+    makeFolderField();
+    makeNotes();
+    layOutDialog();
+    connectFields();
+    revalidate();
+}
 
+void Gq_StartDialog::makeWizardChoice()
+{
     wizard_ = new QComboBox(this);
     wizard_->setObjectName("ComboWizard");
     for (const auto& w : wizards_) {
@@ -56,7 +84,10 @@ Gq_StartDialog::Gq_StartDialog(const Tsy_WizardCatalog& wizards, const Tsy_Devic
     int dcm = wizard_->findData("dcm");
     if (dcm >= 0)
         wizard_->setCurrentIndex(dcm);
+}
 
+void Gq_StartDialog::makePartChoice()
+{
     part_ = new QComboBox(this);
     part_->setObjectName("ComboPart");
     part_->setEditable(true);
@@ -65,51 +96,57 @@ Gq_StartDialog::Gq_StartDialog(const Tsy_WizardCatalog& wizards, const Tsy_Devic
     for (const auto& p : devices_.Parts())
         parts << QString::fromStdString(p.part);
     part_->addItems(parts);
-    // Part names are long and alike: match anywhere in the name, any case.
-    auto* completer = new QCompleter(parts, part_);
-    completer->setCaseSensitivity(Qt::CaseInsensitive);
-    completer->setFilterMode(Qt::MatchContains);
-    completer->setCompletionMode(QCompleter::PopupCompletion);
-    part_->setCompleter(completer);
+    // Part names are long and alike: any piece of one finds it.
+    part_->setCompleter(anywhereCompleter(parts, part_));
     if (!parts.isEmpty())
         part_->setCurrentIndex(0);
+}
 
+void Gq_StartDialog::makeModuleField()
+{
     module_ = new QLineEdit("clkgen", this);
     module_->setObjectName("LineEditModule");
     module_->setToolTip("The name of the generated HDL module; it must be legal in both Verilog and VHDL.");
+}
 
+void Gq_StartDialog::makeFolderField()
+{
     folder_ = new QLineEdit(".", this);
     folder_->setObjectName("LineEditFolder");
     folder_->setToolTip("The folder that Finish writes the design and HDL files into.");
     browse_ = new QPushButton("&Browse...", this);
     browse_->setObjectName("PushButtonBrowse");
     browse_->setAutoDefault(false);
+}
 
+void Gq_StartDialog::makeNotes()
+{
     partNote_ = makeNote(this, "TextLabelPartProblem");
     moduleNote_ = makeNote(this, "TextLabelModuleProblem");
     folderNote_ = makeNote(this, "TextLabelFolderProblem");
+}
 
+// Each field with its label, and under it the note that says what is wrong
+// with it.
+QFormLayout* Gq_StartDialog::fieldForm()
+{
     auto* folderRow = new QHBoxLayout;
     folderRow->addWidget(folder_, 1);
     folderRow->addWidget(browse_);
 
     auto* form = new QFormLayout;
-    auto* wizardLabel = new QLabel("&Wizard type:", this);
-    wizardLabel->setBuddy(wizard_);
-    auto* partLabel = new QLabel("&Part:", this);
-    partLabel->setBuddy(part_);
-    auto* moduleLabel = new QLabel("&Module name:", this);
-    moduleLabel->setBuddy(module_);
-    auto* folderLabel = new QLabel("Output &folder:", this);
-    folderLabel->setBuddy(folder_);
-    form->addRow(wizardLabel, wizard_);
-    form->addRow(partLabel, part_);
+    form->addRow(buddyLabel(this, "&Wizard type:", wizard_), wizard_);
+    form->addRow(buddyLabel(this, "&Part:", part_), part_);
     form->addRow(QString(), partNote_);
-    form->addRow(moduleLabel, module_);
+    form->addRow(buddyLabel(this, "&Module name:", module_), module_);
     form->addRow(QString(), moduleNote_);
-    form->addRow(folderLabel, folderRow);
+    form->addRow(buddyLabel(this, "Output &folder:", folder_), folderRow);
     form->addRow(QString(), folderNote_);
+    return form;
+}
 
+QDialogButtonBox* Gq_StartDialog::makeButtonBox()
+{
     auto* buttons = new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel, this);
     ok_ = buttons->button(QDialogButtonBox::Ok);
     ok_->setText("&OK");
@@ -120,20 +157,27 @@ Gq_StartDialog::Gq_StartDialog(const Tsy_WizardCatalog& wizards, const Tsy_Devic
             accept();
     });
     connect(buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    return buttons;
+}
 
+void Gq_StartDialog::layOutDialog()
+{
+    QFormLayout* form = fieldForm();
+    QDialogButtonBox* buttons = makeButtonBox();
     auto* layout = new QVBoxLayout(this);
     layout->addLayout(form);
     layout->addStretch(1);
     layout->addWidget(buttons);
     setMinimumWidth(480);
+}
 
+void Gq_StartDialog::connectFields()
+{
     connect(wizard_, &QComboBox::currentIndexChanged, this, [this] { revalidate(); });
     connect(part_, &QComboBox::currentTextChanged, this, [this] { revalidate(); });
     connect(module_, &QLineEdit::textChanged, this, [this] { revalidate(); });
     connect(folder_, &QLineEdit::textChanged, this, [this] { revalidate(); });
     connect(browse_, &QPushButton::clicked, this, [this] { browse(); });
-
-    revalidate();
 }
 
 Gq_StartDialog::~Gq_StartDialog() = default;

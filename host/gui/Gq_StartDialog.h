@@ -9,6 +9,8 @@
 #include <vector>
 
 class QComboBox;
+class QDialogButtonBox;
+class QFormLayout;
 class QLabel;
 class QLineEdit;
 class QPushButton;
@@ -44,6 +46,16 @@ public:
     QPushButton* okButton() const { return ok_; }
 
 private:
+    void makeWizardChoice();
+    void makePartChoice();
+    void makeModuleField();
+    void makeFolderField();
+    void makeNotes();
+    QFormLayout* fieldForm();
+    QDialogButtonBox* makeButtonBox();
+    void layOutDialog();
+    void connectFields();
+
     void revalidate();
     void browse();
     QString partProblem() const;

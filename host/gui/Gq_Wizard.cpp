@@ -20,13 +20,53 @@ QString literal(const QString& text)
     return out.replace('&', "&&");
 }
 
+QFrame* sunkenLine(QWidget* parent)
+{
+    auto* line = new QFrame(parent);
+    line->setFrameShape(QFrame::HLine);
+    line->setFrameShadow(QFrame::Sunken);
+    return line;
+}
+
+struct ButtonLook {
+    const char* name;
+    const char* text;
+    QKeySequence key;
+    const char* tip;
+};
+
+QPushButton* makeButton(QWidget* parent, const ButtonLook& look)
+{
+    auto* b = new QPushButton(parent);
+    b->setObjectName(look.name);
+    b->setText(look.text);
+    b->setShortcut(look.key);
+    b->setToolTip(look.tip);
+    b->setAutoDefault(false);
+    return b;
+}
+
 } // namespace
 
 Gq_Wizard::Gq_Wizard(QWidget* parent) : QDialog(parent)
 {
     setObjectName("Gq_Wizard");
     setSizeGripEnabled(true);
+    makeTitle();
+    makePageStack();
+    makeButtons();
+    connectButtons();
+    layOutWindow();
+    // Room for the largest page form plus the title and the button row.
+    setMinimumSize(740, 620);
+    // Tab walks the page first, then the buttons left to right.
+    for (int i = 0; i + 1 < 6; ++i)
+        setTabOrder(buttons_[i], buttons_[i + 1]);
+    updateButtons();
+}
 
+void Gq_Wizard::makeTitle()
+{
     title_ = new QLabel(this);
     title_->setObjectName("WizardPageTitle");
     QFont titleFont = title_->font();
@@ -34,30 +74,23 @@ Gq_Wizard::Gq_Wizard(QWidget* parent) : QDialog(parent)
     titleFont.setPointSizeF(titleFont.pointSizeF() * 1.25);
     title_->setFont(titleFont);
     title_->setTextFormat(Qt::PlainText);
+}
 
+void Gq_Wizard::makePageStack()
+{
     stack_ = new QStackedWidget(this);
     stack_->setObjectName("WizardPageStack");
     // Shown while no page is current, so the stack never shows a stale page.
     blank_ = new QWidget(stack_);
     stack_->addWidget(blank_);
+}
 
-    auto makeLine = [this] {
-        auto* line = new QFrame(this);
-        line->setFrameShape(QFrame::HLine);
-        line->setFrameShadow(QFrame::Sunken);
-        return line;
-    };
-
-    struct Spec {
-        const char* name;
-        const char* text;
-        QKeySequence key;
-        const char* tip;
-    };
+void Gq_Wizard::makeButtons()
+{
     // The page forms carry their own Alt-letter accelerators (Alt+N, Alt+F
     // and Alt+M among them), so the buttons every page shares keep to keys
     // no form uses: Enter for Next (Finish on the last page), Esc for Cancel.
-    const Spec specs[6] = {
+    const ButtonLook looks[6] = {
         {"ButtonMoreInfo", "More Info", QKeySequence(Qt::Key_F1), "Open the help page of this page (F1)"},
         {"ButtonAdvanced", "&Advanced...", QKeySequence(Qt::ALT | Qt::Key_A),
          "Open the advanced settings of this page (Alt+A)"},
@@ -67,17 +100,13 @@ Gq_Wizard::Gq_Wizard(QWidget* parent) : QDialog(parent)
         // Esc is the dialog's own: it rejects at once, like the button.
         {"ButtonCancel", "Cancel", QKeySequence(), "Close the wizard without writing anything (Esc)"},
     };
-    for (int i = 0; i < 6; ++i) {
-        auto* b = new QPushButton(this);
-        b->setObjectName(specs[i].name);
-        b->setText(specs[i].text);
-        b->setShortcut(specs[i].key);
-        b->setToolTip(specs[i].tip);
-        b->setAutoDefault(false);
-        buttons_[i] = b;
-    }
+    for (int i = 0; i < 6; ++i)
+        buttons_[i] = makeButton(this, looks[i]);
     buttons_[Next]->setDefault(true);
+}
 
+void Gq_Wizard::connectButtons()
+{
     connect(buttons_[MoreInfo], &QPushButton::clicked, this, [this] {
         if (Gq_WizardPage* p = currentPage())
             p->onMoreInfo();
@@ -90,7 +119,10 @@ Gq_Wizard::Gq_Wizard(QWidget* parent) : QDialog(parent)
     connect(buttons_[Next], &QPushButton::clicked, this, [this] { goNext(); });
     connect(buttons_[Finish], &QPushButton::clicked, this, [this] { finish(); });
     connect(buttons_[Cancel], &QPushButton::clicked, this, &Gq_Wizard::reject);
+}
 
+QHBoxLayout* Gq_Wizard::buttonRow() const
+{
     auto* row = new QHBoxLayout;
     row->addWidget(buttons_[MoreInfo]);
     row->addWidget(buttons_[Advanced]);
@@ -100,22 +132,18 @@ Gq_Wizard::Gq_Wizard(QWidget* parent) : QDialog(parent)
     row->addSpacing(12);
     row->addWidget(buttons_[Finish]);
     row->addWidget(buttons_[Cancel]);
+    return row;
+}
 
+void Gq_Wizard::layOutWindow()
+{
+    QHBoxLayout* row = buttonRow();
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(title_);
-    layout->addWidget(makeLine());
+    layout->addWidget(sunkenLine(this));
     layout->addWidget(stack_, 1);
-    layout->addWidget(makeLine());
+    layout->addWidget(sunkenLine(this));
     layout->addLayout(row);
-
-    // Room for the largest page form plus the title and the button row.
-    setMinimumSize(740, 620);
-
-    // Tab walks the page first, then the buttons left to right.
-    for (int i = 0; i + 1 < 6; ++i)
-        setTabOrder(buttons_[i], buttons_[i + 1]);
-
-    updateButtons();
 }
 
 Gq_Wizard::~Gq_Wizard()

@@ -8,6 +8,7 @@
 #include <functional>
 
 class Gq_WizardPage;
+class QHBoxLayout;
 class QLabel;
 class QPushButton;
 class QStackedWidget;
@@ -50,6 +51,13 @@ protected:
     void reject() override;
 
 private:
+    void makeTitle();
+    void makePageStack();
+    void makeButtons();
+    void connectButtons();
+    QHBoxLayout* buttonRow() const;
+    void layOutWindow();
+
     void showPage(int index);
     bool enter(int index, int step);
     bool moveTo(int index, int step);

@@ -1,6 +1,7 @@
 #include "hdl/Tsy_HdlWriter.h"
 
 #include "hdl/Tsy_HdlNetlist.h"
+#include "hdl/Tsy_HdlText.h"
 #include "hdl/Tsy_HdlValues.h"
 #include "lib/Tsy_PrimitiveLibrary.h"
 
@@ -24,31 +25,9 @@ bool Tsy_WriteHdl(const Tsy_WizData& data, const std::string& module, const std:
 
 namespace {
 
-bool isWizardAttribute(const std::string& name)
-{
-    return name.rfind("TESY_ONLY_", 0) == 0 || name.rfind("TSY_", 0) == 0;
-}
-
-std::vector<const Tsy_AttrDef*> hdlAttributes(const Tsy_PrimitiveDef& def)
-{
-    std::vector<const Tsy_AttrDef*> out;
-    for (const auto& ad : def.attributes)
-        if (ad.hdl && !isWizardAttribute(ad.name))
-            out.push_back(&ad);
-    return out;
-}
-
-std::string defaultOf(const Tsy_AttrDef& ad)
-{
-    std::string value, expected;
-    if (!Tsy_HdlCanonicalValue(ad.hdlType, ad.defaultValue, value, expected))
-        value = Tsy_HdlNeutralValue(ad.hdlType);
-    return value;
-}
-
 std::string verilogParameter(const Tsy_AttrDef& ad)
 {
-    std::string value = defaultOf(ad);
+    std::string value = Tsy_HdlDefaultValue(ad);
     std::string kind;
     if (ad.hdlType == "integer")
         kind = "integer ";
@@ -80,7 +59,7 @@ std::string Tsy_VerilogPrimitiveModels(const Tsy_PrimitiveLibrary& library)
     for (const auto& type : library.Types()) {
         const Tsy_PrimitiveDef& def = *library.Find(type);
         out += "\n(* blackbox *)\nmodule " + def.type;
-        std::vector<const Tsy_AttrDef*> params = hdlAttributes(def);
+        std::vector<const Tsy_AttrDef*> params = Tsy_HdlParameterDefs(def);
         if (!params.empty()) {
             out += " #(\n";
             for (size_t i = 0; i < params.size(); ++i)

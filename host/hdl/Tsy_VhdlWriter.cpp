@@ -1,4 +1,5 @@
 #include "hdl/Tsy_HdlNetlist.h"
+#include "hdl/Tsy_HdlText.h"
 #include "hdl/Tsy_HdlValues.h"
 #include "hdl/Tsy_HdlWriter.h"
 #include "lib/Tsy_PrimitiveLibrary.h"
@@ -7,6 +8,11 @@
 #include <map>
 
 namespace {
+
+using PortItems = std::vector<std::pair<std::string, std::string>>;
+// The output ports the architecture reads, each with the signal that
+// stands in for it there.
+using InnerSignals = std::map<std::string, std::string>;
 
 std::string type(int width)
 {
@@ -19,32 +25,35 @@ std::string constant(int width, bool high)
     return width > 1 ? "\"" + std::string(static_cast<size_t>(width), bit) + "\"" : std::string("'") + bit + "'";
 }
 
-std::string padded(const std::string& s, size_t width)
-{
-    return s + std::string(width > s.size() ? width - s.size() : 0, ' ');
-}
-
 std::string comments(const std::vector<std::string>& banner)
 {
-    std::string out;
-    for (const auto& line : banner)
-        out += line.empty() ? "--\n" : "-- " + line + "\n";
-    return out;
+    return Tsy_HdlCommentBanner(banner, "--");
 }
 
 const char* const kLibraries = "library ieee;\nuse ieee.std_logic_1164.all;\n";
 
-// "    NAME : in  std_logic;" lines of a port clause, the last without ';'.
-std::string portClause(const std::vector<std::pair<std::string, std::string>>& items, const std::string& indent)
+std::string mode(bool input)
 {
-    size_t w = 0;
-    for (const auto& it : items)
-        w = std::max(w, it.first.size());
+    return input ? "in  " : "out ";
+}
+
+// "    NAME : in  std_logic;" lines of a port clause, the last without ';'.
+std::string portClause(const PortItems& items, const std::string& indent)
+{
+    size_t w = Tsy_HdlColumnWidth(items, [](const auto& it) { return it.first; });
     std::string out = indent + "port (\n";
     for (size_t i = 0; i < items.size(); ++i)
-        out += indent + "    " + padded(items[i].first, w) + " : " + items[i].second +
-               (i + 1 < items.size() ? ";\n" : "\n");
+        out += indent + "    " + Tsy_HdlPadded(items[i].first, w) + " : " + items[i].second +
+               Tsy_HdlItemEnd(i, items.size(), ";");
     return out + indent + ");\n";
+}
+
+PortItems portItemsOf(const Tsy_HdlNetlist& n)
+{
+    PortItems items;
+    for (const auto& p : n.ports)
+        items.emplace_back(p.name, mode(p.kind == Tsy_HdlSignal::Input) + type(p.width));
+    return items;
 }
 
 std::string genericType(const Tsy_AttrDef& ad)
@@ -60,9 +69,157 @@ std::string genericType(const Tsy_AttrDef& ad)
     return "string";
 }
 
-bool isWizardAttribute(const std::string& name)
+std::string genericClause(const std::vector<const Tsy_AttrDef*>& generics, const std::string& indent)
 {
-    return name.rfind("TESY_ONLY_", 0) == 0 || name.rfind("TSY_", 0) == 0;
+    size_t w = Tsy_HdlColumnWidth(generics, [](const Tsy_AttrDef* ad) { return ad->name; });
+    std::string out = indent + "    generic (\n";
+    for (size_t i = 0; i < generics.size(); ++i) {
+        const Tsy_AttrDef& ad = *generics[i];
+        out += indent + "        " + Tsy_HdlPadded(ad.name, w) + " : " + genericType(ad) + " := " +
+               Tsy_VhdlValue(ad.hdlType, Tsy_HdlDefaultValue(ad)) + Tsy_HdlItemEnd(i, generics.size(), ";");
+    }
+    return out + indent + "    );\n";
+}
+
+// "    attribute NAME of SIGNAL : signal is VALUE;" for each attribute.
+std::string attributeValues(const Tsy_HdlSignal& s)
+{
+    std::string out;
+    for (const auto& a : s.attributes)
+        out += "    attribute " + a.name + " of " + s.name + " : signal is " + Tsy_VhdlValue("string", a.value) +
+               ";\n";
+    return out;
+}
+
+// An output port cannot be read inside a VHDL-93 architecture: those the
+// design reads get a signal that carries their value and drives them.
+InnerSignals innerSignalsOf(Tsy_HdlNetlist& n)
+{
+    InnerSignals inner;
+    for (const auto& p : n.ports)
+        if (p.readInside)
+            inner[p.name] = n.FreshName(p.name + "_int");
+    return inner;
+}
+
+// The name the architecture uses for a net.
+std::string insideName(const InnerSignals& inner, const std::string& name)
+{
+    auto it = inner.find(name);
+    return it == inner.end() ? name : it->second;
+}
+
+std::string entity(const Tsy_HdlNetlist& n)
+{
+    std::string out = "entity " + n.module + " is\n";
+    if (!n.ports.empty())
+        out += portClause(portItemsOf(n), "    ");
+    // Attributes are declared with the entity, where the ports' own must be
+    // specified; the architecture sees the declarations.
+    for (const auto& a : n.attributeNames)
+        out += "    attribute " + a + " : string;\n";
+    for (const auto& p : n.ports)
+        out += attributeValues(p);
+    return out + "end entity " + n.module + ";\n";
+}
+
+std::string signalDeclarations(const Tsy_HdlNetlist& n, const InnerSignals& inner)
+{
+    std::vector<std::pair<std::string, int>> signals;
+    for (const auto& w : n.wires)
+        signals.emplace_back(w.name, w.width);
+    for (const auto& p : n.ports)
+        if (p.readInside)
+            signals.emplace_back(inner.at(p.name), p.width);
+    std::sort(signals.begin(), signals.end());
+    if (signals.empty())
+        return std::string();
+    size_t w = Tsy_HdlColumnWidth(signals, [](const auto& s) { return s.first; });
+    std::string out = "\n";
+    for (const auto& s : signals)
+        out += "    signal " + Tsy_HdlPadded(s.first, w) + " : " + type(s.second) + ";\n";
+    return out;
+}
+
+std::string architectureDeclarations(const Tsy_HdlNetlist& n, const InnerSignals& inner)
+{
+    std::string out;
+    for (const auto* def : n.used)
+        out += "\n" + Tsy_VhdlComponent(*def, "    ");
+    out += signalDeclarations(n, inner);
+    for (const auto& wire : n.wires)
+        out += attributeValues(wire);
+    return out;
+}
+
+std::string concurrentAssignments(const Tsy_HdlNetlist& n, const InnerSignals& inner)
+{
+    if (n.assigns.empty() && inner.empty())
+        return std::string();
+    std::string out = "\n";
+    for (const auto& a : n.assigns)
+        out += "    " + insideName(inner, a.target) + " <= " + insideName(inner, a.source) + ";\n";
+    for (const auto& [port, signal] : inner)
+        out += "    " + port + " <= " + signal + ";\n";
+    return out;
+}
+
+std::string genericMap(const Tsy_HdlInstance& inst)
+{
+    if (inst.parameters.empty())
+        return std::string();
+    size_t w = Tsy_HdlColumnWidth(inst.parameters, [](const Tsy_HdlParameter& p) { return p.name; });
+    std::string out = "        generic map (\n";
+    for (size_t k = 0; k < inst.parameters.size(); ++k) {
+        const auto& p = inst.parameters[k];
+        out += "            " + Tsy_HdlPadded(p.name, w) + " => " + Tsy_VhdlValue(p.type, p.value) +
+               Tsy_HdlItemEnd(k, inst.parameters.size(), ",");
+    }
+    return out + "        )\n";
+}
+
+std::string actual(const Tsy_HdlPinUse& use, const InnerSignals& inner)
+{
+    switch (use.conn.kind) {
+    case Tsy_HdlConnection::Net: return insideName(inner, use.conn.net);
+    case Tsy_HdlConnection::Low: return constant(use.width, false);
+    case Tsy_HdlConnection::High: return constant(use.width, true);
+    case Tsy_HdlConnection::Open: return "open";
+    }
+    return std::string();
+}
+
+std::string portMap(const Tsy_HdlInstance& inst, const InnerSignals& inner)
+{
+    size_t w = Tsy_HdlColumnWidth(inst.pins, [](const Tsy_HdlPinUse& use) { return use.pin; });
+    std::string out = "        port map (\n";
+    for (size_t k = 0; k < inst.pins.size(); ++k) {
+        const auto& use = inst.pins[k];
+        out += "            " + Tsy_HdlPadded(use.pin, w) + " => " + actual(use, inner) +
+               Tsy_HdlItemEnd(k, inst.pins.size(), ",");
+    }
+    return out + "        );\n";
+}
+
+std::string instance(const Tsy_HdlInstance& inst, const InnerSignals& inner)
+{
+    std::string out = "\n    " + inst.name + " : " + inst.type + "\n" + genericMap(inst);
+    if (!inst.pins.empty())
+        return out + portMap(inst, inner);
+    // Without a port map the statement ends with its last line.
+    out.insert(out.size() - 1, ";");
+    return out;
+}
+
+std::string architecture(const Tsy_HdlNetlist& n, const InnerSignals& inner)
+{
+    std::string out = "architecture structure of " + n.module + " is\n";
+    out += architectureDeclarations(n, inner);
+    out += "\nbegin\n";
+    out += concurrentAssignments(n, inner);
+    for (const auto& inst : n.instances)
+        out += instance(inst, inner);
+    return out + "\nend architecture structure;\n";
 }
 
 } // namespace
@@ -70,28 +227,12 @@ bool isWizardAttribute(const std::string& name)
 std::string Tsy_VhdlComponent(const Tsy_PrimitiveDef& def, const std::string& indent)
 {
     std::string out = indent + "component " + def.type + "\n";
-    std::vector<const Tsy_AttrDef*> generics;
-    for (const auto& ad : def.attributes)
-        if (ad.hdl && !isWizardAttribute(ad.name))
-            generics.push_back(&ad);
-    if (!generics.empty()) {
-        size_t w = 0;
-        for (const auto* ad : generics)
-            w = std::max(w, ad->name.size());
-        out += indent + "    generic (\n";
-        for (size_t i = 0; i < generics.size(); ++i) {
-            const Tsy_AttrDef& ad = *generics[i];
-            std::string value, expected;
-            if (!Tsy_HdlCanonicalValue(ad.hdlType, ad.defaultValue, value, expected))
-                value = Tsy_HdlNeutralValue(ad.hdlType);
-            out += indent + "        " + padded(ad.name, w) + " : " + genericType(ad) + " := " +
-                   Tsy_VhdlValue(ad.hdlType, value) + (i + 1 < generics.size() ? ";\n" : "\n");
-        }
-        out += indent + "    );\n";
-    }
-    std::vector<std::pair<std::string, std::string>> ports;
+    std::vector<const Tsy_AttrDef*> generics = Tsy_HdlParameterDefs(def);
+    if (!generics.empty())
+        out += genericClause(generics, indent);
+    PortItems ports;
     for (const auto& pd : def.pins)
-        ports.emplace_back(pd.name, (pd.direction == "IN" ? "in  " : "out ") + type(pd.width));
+        ports.emplace_back(pd.name, mode(pd.direction == "IN") + type(pd.width));
     if (!ports.empty())
         out += portClause(ports, indent + "    ");
     return out + indent + "end component;\n";
@@ -99,104 +240,8 @@ std::string Tsy_VhdlComponent(const Tsy_PrimitiveDef& def, const std::string& in
 
 std::string Tsy_WriteVhdl(Tsy_HdlNetlist& n, const std::vector<std::string>& banner)
 {
-    // An output port cannot be read inside a VHDL-93 architecture: those the
-    // design reads get a signal that carries their value and drives them.
-    std::map<std::string, std::string> inner;
-    for (const auto& p : n.ports)
-        if (p.readInside)
-            inner[p.name] = n.FreshName(p.name + "_int");
-    auto ref = [&](const std::string& name) {
-        auto it = inner.find(name);
-        return it == inner.end() ? name : it->second;
-    };
-
-    std::string out = comments(banner) + "\n" + kLibraries + "\n";
-    out += "entity " + n.module + " is\n";
-    if (!n.ports.empty()) {
-        std::vector<std::pair<std::string, std::string>> items;
-        for (const auto& p : n.ports)
-            items.emplace_back(p.name, (p.kind == Tsy_HdlSignal::Input ? "in  " : "out ") + type(p.width));
-        out += portClause(items, "    ");
-    }
-    // Attributes are declared with the entity, where the ports' own must be
-    // specified; the architecture sees the declarations.
-    for (const auto& a : n.attributeNames)
-        out += "    attribute " + a + " : string;\n";
-    for (const auto& p : n.ports)
-        for (const auto& a : p.attributes)
-            out += "    attribute " + a.name + " of " + p.name + " : signal is " + Tsy_VhdlValue("string", a.value) +
-                   ";\n";
-    out += "end entity " + n.module + ";\n\n";
-
-    out += "architecture structure of " + n.module + " is\n";
-    for (const auto* def : n.used)
-        out += "\n" + Tsy_VhdlComponent(*def, "    ");
-    std::vector<std::pair<std::string, int>> signals;
-    for (const auto& w : n.wires)
-        signals.emplace_back(w.name, w.width);
-    for (const auto& p : n.ports)
-        if (p.readInside)
-            signals.emplace_back(inner[p.name], p.width);
-    std::sort(signals.begin(), signals.end());
-    if (!signals.empty()) {
-        size_t w = 0;
-        for (const auto& s : signals)
-            w = std::max(w, s.first.size());
-        out += "\n";
-        for (const auto& s : signals)
-            out += "    signal " + padded(s.first, w) + " : " + type(s.second) + ";\n";
-    }
-    for (const auto& wire : n.wires)
-        for (const auto& a : wire.attributes)
-            out += "    attribute " + a.name + " of " + wire.name + " : signal is " +
-                   Tsy_VhdlValue("string", a.value) + ";\n";
-    out += "\nbegin\n";
-
-    if (!n.assigns.empty() || !inner.empty()) {
-        out += "\n";
-        for (const auto& a : n.assigns)
-            out += "    " + ref(a.target) + " <= " + ref(a.source) + ";\n";
-        for (const auto& [port, signal] : inner)
-            out += "    " + port + " <= " + signal + ";\n";
-    }
-
-    for (const auto& inst : n.instances) {
-        out += "\n    " + inst.name + " : " + inst.type + "\n";
-        if (!inst.parameters.empty()) {
-            size_t w = 0;
-            for (const auto& p : inst.parameters)
-                w = std::max(w, p.name.size());
-            out += "        generic map (\n";
-            for (size_t k = 0; k < inst.parameters.size(); ++k) {
-                const auto& p = inst.parameters[k];
-                out += "            " + padded(p.name, w) + " => " + Tsy_VhdlValue(p.type, p.value) +
-                       (k + 1 < inst.parameters.size() ? ",\n" : "\n");
-            }
-            out += "        )\n";
-        }
-        size_t w = 0;
-        for (const auto& use : inst.pins)
-            w = std::max(w, use.pin.size());
-        if (inst.pins.empty()) {
-            out.insert(out.size() - 1, ";");
-            continue;
-        }
-        out += "        port map (\n";
-        for (size_t k = 0; k < inst.pins.size(); ++k) {
-            const auto& use = inst.pins[k];
-            std::string actual;
-            switch (use.conn.kind) {
-            case Tsy_HdlConnection::Net: actual = ref(use.conn.net); break;
-            case Tsy_HdlConnection::Low: actual = constant(use.width, false); break;
-            case Tsy_HdlConnection::High: actual = constant(use.width, true); break;
-            case Tsy_HdlConnection::Open: actual = "open"; break;
-            }
-            out += "            " + padded(use.pin, w) + " => " + actual + (k + 1 < inst.pins.size() ? ",\n" : "\n");
-        }
-        out += "        );\n";
-    }
-    out += "\nend architecture structure;\n";
-    return out;
+    const InnerSignals inner = innerSignalsOf(n);
+    return comments(banner) + "\n" + kLibraries + "\n" + entity(n) + "\n" + architecture(n, inner);
 }
 
 std::string Tsy_WriteVhdlTemplate(const Tsy_HdlNetlist& n, const std::vector<std::string>& banner)
@@ -206,21 +251,16 @@ std::string Tsy_WriteVhdlTemplate(const Tsy_HdlNetlist& n, const std::vector<std
            "-- part of your architecture and the instance in its statement part, with\n"
            "-- your signals in place of the names after the arrows.\n\n";
     out += "component " + n.module + "\n";
-    std::vector<std::pair<std::string, std::string>> items;
-    for (const auto& p : n.ports)
-        items.emplace_back(p.name, (p.kind == Tsy_HdlSignal::Input ? "in  " : "out ") + type(p.width));
-    if (!items.empty())
-        out += portClause(items, "    ");
+    if (!n.ports.empty())
+        out += portClause(portItemsOf(n), "    ");
     out += "end component;\n\n";
     out += n.module + "_inst : " + n.module;
     if (n.ports.empty())
         return out + ";\n";
-    size_t w = 0;
-    for (const auto& p : n.ports)
-        w = std::max(w, p.name.size());
+    size_t w = Tsy_HdlColumnWidth(n.ports, [](const Tsy_HdlSignal& p) { return p.name; });
     out += "\n    port map (\n";
     for (size_t i = 0; i < n.ports.size(); ++i)
-        out += "        " + padded(n.ports[i].name, w) + " => " + n.ports[i].name +
-               (i + 1 < n.ports.size() ? ",\n" : "\n");
+        out += "        " + Tsy_HdlPadded(n.ports[i].name, w) + " => " + n.ports[i].name +
+               Tsy_HdlItemEnd(i, n.ports.size(), ",");
     return out + "    );\n";
 }

@@ -51,6 +51,17 @@ bool isBufferBlockType(const StringBase& type)
     return Rec::IsGlobalType(type);
 }
 
+// The row of a clock multiplexer names the output on its I1.
+StringBase muxSecondInput(const Tsy_Pin* pin, int n, const StringBase& type)
+{
+    if (!Rec::IsMuxType(type))
+        return StringBase();
+    StringBase i1 = pin->GetAttributeValue(StringBase::Printf(Tsy_Attr::TSY_CLKBUF_N_I1_PINNAME, n));
+    if (i1.IsEmpty())
+        i1 = pin->GetAttributeValue(Tsy_Attr::TSY_CLKMUX_I1);
+    return i1;
+}
+
 } // namespace
 
 Tsy_ClockBufDlgGui::Tsy_ClockBufDlgGui(Tsy_ClockBufDlg* page, QWidget* parent, int instNum)
@@ -398,172 +409,223 @@ void Tsy_ClockBufDlgGui::defaultPass(bool dcmRules)
         if (Tsy_Block* dcm = dcmBlock())
             LoadFeedbackSettings(dcm);
     const bool internal = dcmRules && internalFeedback();
-    // PLL outputs carry no CLKIN entry; DCM and PMCD lists end with it.
-    auto takesNoDefaultRow = [this](const Output& o) { return !isPllDesign() && isClkin(o.pin); };
     lastUsedRow_ = 0;
-    int r = 1;
-
-    if (mode_ == ModeGlobal) {
-        for (const Output& o : outputs_) {
-            if (takesNoDefaultRow(o))
-                continue;
-            if (r > kRows) {
-                reportOverflow(o.shown);
-                continue;
-            }
-            Tsy_Pin* pin = pinOf(o);
-            int state = Rec::ReadRowState(1, pin);
-            SetRow(r, "BUFG", 1, o.shown, StringBase(), state);
-            rows_[r].pmcdInst = o.pmcdInst;
-            // The feedback buffer is the feedback path's own; buffers another
-            // page fixed keep their type.
-            bool feedback = internal && o.pin.EqualsNoCase(fbOutput_);
-            if (pin && !feedback && (state == Rec::StateEnabled || Rec::TypeOf(pin, 1).IsEmpty()))
-                pin->AddAttribute(typeRecord(1), "BUFG");
-            lastUsedRow_ = r++;
-        }
-        for (; r <= kRows; ++r)
-            SetRow(r, StringBase(), 0, StringBase(), StringBase(), Rec::StateDefault);
-        return;
-    }
-
-    for (const Output& o : outputs_) {
-        Tsy_Pin* pin = pinOf(o);
-        if (!pin)
-            continue;
-        // A pin holds far fewer buffers than this; the bound only guards
-        // against a malformed design.
-        for (int n = 1; n <= 999; ++n) {
-            int state = Rec::StateEnabled;
-            StringBase type = NormalizeBufferType(pin, n, o.shown, state);
-            if (type.IsEmpty()) {
-                if (n == 1 && !takesNoDefaultRow(o)) {
-                    if (r > kRows) {
-                        reportOverflow(o.shown);
-                        break;
-                    }
-                    int st = internal && o.pin.EqualsNoCase(fbOutput_) ? Rec::StateFeedback : Rec::StateEnabled;
-                    SetRow(r, "BUFG", 1, o.shown, StringBase(), st);
-                    rows_[r].pmcdInst = o.pmcdInst;
-                    lastUsedRow_ = r++;
-                    if (st != Rec::StateFeedback) {
-                        pin->AddAttribute(typeRecord(1), "BUFG");
-                        pin->AddAttribute("TSY_CLKBUFTYPE1_NOEDIT", Tsy_BufState::ENABLED);
-                    }
-                }
-                break;
-            }
-            if (r > kRows) {
-                reportOverflow(o.shown);
-                break;
-            }
-            StringBase i1;
-            if (Rec::IsMuxType(type)) {
-                i1 = pin->GetAttributeValue(StringBase::Printf(Tsy_Attr::TSY_CLKBUF_N_I1_PINNAME, n));
-                if (i1.IsEmpty())
-                    i1 = pin->GetAttributeValue(Tsy_Attr::TSY_CLKMUX_I1);
-            }
-            StringBase i0 = o.shown;
-            if (wizType_ == Tsy_DCMwiz::TypeClockSwitching && instNum_ == 2 &&
-                (type.EqualsNoCase("BUFGMUX") || type.EqualsNoCase("BUFGCTRL")) &&
-                (state == Rec::StateDisabled || state == Rec::StateDefault)) {
-                StringBase other = pin->GetAttributeValue(Tsy_Attr::TSY_CLKMUX_I0);
-                if (!other.IsEmpty())
-                    i0 = other;
-            }
-            SetRow(r, type, n, i0, i1, state);
-            rows_[r].pmcdInst = o.pmcdInst;
-            lastUsedRow_ = r++;
-        }
-    }
+    int r = mode_ == ModeGlobal ? globalBufferRows(internal) : recordedBufferRows(internal);
     // Rows past the last buffer would otherwise keep what they showed
     // before a buffer was deleted, and be counted by the checks on Next.
     for (; r <= kRows; ++r)
         SetRow(r, StringBase(), 0, StringBase(), StringBase(), Rec::StateDefault);
 }
 
+// PLL outputs carry no CLKIN entry; DCM and PMCD lists end with it.
+bool Tsy_ClockBufDlgGui::takesNoDefaultRow(const Output& o) const
+{
+    return !isPllDesign() && isClkin(o.pin);
+}
+
+bool Tsy_ClockBufDlgGui::closesFeedbackLoop(const Output& o, bool internal) const
+{
+    return internal && o.pin.EqualsNoCase(fbOutput_);
+}
+
+int Tsy_ClockBufDlgGui::takeRow(int r, const StringBase& type, int n, const StringBase& i0, const StringBase& i1,
+                                int state, const Output& o)
+{
+    SetRow(r, type, n, i0, i1, state);
+    rows_[r].pmcdInst = o.pmcdInst;
+    lastUsedRow_ = r;
+    return r + 1;
+}
+
+int Tsy_ClockBufDlgGui::globalBufferRows(bool internal)
+{
+    int r = 1;
+    for (const Output& o : outputs_) {
+        if (takesNoDefaultRow(o))
+            continue;
+        if (r > kRows) {
+            reportOverflow(o.shown);
+            continue;
+        }
+        Tsy_Pin* pin = pinOf(o);
+        int state = Rec::ReadRowState(1, pin);
+        r = takeRow(r, "BUFG", 1, o.shown, StringBase(), state, o);
+        // The feedback buffer is the feedback path's own; buffers another
+        // page fixed keep their type.
+        if (pin && !closesFeedbackLoop(o, internal) && (state == Rec::StateEnabled || Rec::TypeOf(pin, 1).IsEmpty()))
+            pin->AddAttribute(typeRecord(1), "BUFG");
+    }
+    return r;
+}
+
+int Tsy_ClockBufDlgGui::recordedBufferRows(bool internal)
+{
+    int r = 1;
+    for (const Output& o : outputs_)
+        if (Tsy_Pin* pin = pinOf(o))
+            r = recordedRowsOf(o, pin, internal, r);
+    return r;
+}
+
+int Tsy_ClockBufDlgGui::recordedRowsOf(const Output& o, Tsy_Pin* pin, bool internal, int r)
+{
+    // A pin holds far fewer buffers than this; the bound only guards
+    // against a malformed design.
+    for (int n = 1; n <= 999; ++n) {
+        int state = Rec::StateEnabled;
+        StringBase type = NormalizeBufferType(pin, n, o.shown, state);
+        if (type.IsEmpty())
+            return n == 1 && !takesNoDefaultRow(o) ? defaultRowOf(o, pin, internal, r) : r;
+        if (r > kRows) {
+            reportOverflow(o.shown);
+            return r;
+        }
+        StringBase i1 = muxSecondInput(pin, n, type);
+        StringBase i0 = shownFirstInput(o, pin, type, state);
+        r = takeRow(r, type, n, i0, i1, state, o);
+    }
+    return r;
+}
+
+// An output without buffer records gets a Global Buffer, unless it closes
+// the feedback loop, whose buffer is the feedback path's own.
+int Tsy_ClockBufDlgGui::defaultRowOf(const Output& o, Tsy_Pin* pin, bool internal, int r)
+{
+    if (r > kRows) {
+        reportOverflow(o.shown);
+        return r;
+    }
+    const bool feedback = closesFeedbackLoop(o, internal);
+    r = takeRow(r, "BUFG", 1, o.shown, StringBase(), feedback ? Rec::StateFeedback : Rec::StateEnabled, o);
+    if (!feedback) {
+        pin->AddAttribute(typeRecord(1), "BUFG");
+        pin->AddAttribute("TSY_CLKBUFTYPE1_NOEDIT", Tsy_BufState::ENABLED);
+    }
+    return r;
+}
+
+// The output a row shows on I0: its own, except on a multiplexer of the
+// second DCM of clock switching that another page set, which shows the I0
+// recorded on the pin.
+StringBase Tsy_ClockBufDlgGui::shownFirstInput(const Output& o, const Tsy_Pin* pin, const StringBase& type,
+                                               int state) const
+{
+    const bool sharedMux = wizType_ == Tsy_DCMwiz::TypeClockSwitching && instNum_ == 2 &&
+                           (type.EqualsNoCase("BUFGMUX") || type.EqualsNoCase("BUFGCTRL")) &&
+                           (state == Rec::StateDisabled || state == Rec::StateDefault);
+    if (!sharedMux)
+        return o.shown;
+    StringBase other = pin->GetAttributeValue(Tsy_Attr::TSY_CLKMUX_I0);
+    return other.IsEmpty() ? o.shown : other;
+}
+
 // ---------------------------------------------------------------- legacy designs
 
 void Tsy_ClockBufDlgGui::ConvertLegacyBuffers(bool reload)
 {
-    if (leftByBack_ || mode_ != ModeCustomize || !wiz_ || !wiz_->IsLoadedDesign() || !data_)
+    if (!isLegacyConversionDue(reload))
         return;
-    if (wizType_ == Tsy_DCMwiz::TypePll || wizType_ == Tsy_DCMwiz::TypeDcmToPll || wizType_ == Tsy_DCMwiz::TypePllToDcm)
-        return;
-    const StringBase& version = wiz_->GetDesignVersion();
-    StringBase v = version.Left(3);
-    bool convert = false;
-    if (v == "6.3" && wizType_ == Tsy_DCMwiz::TypeBoardDeskew)
-        convert = true;
-    else if (version.IsEmpty() || v == "6.1" || v == "6.2")
-        convert = wizType_ == Tsy_DCMwiz::TypeClockSwitching ? v == "6.2" : reload;
-    if (!convert)
-        return;
-
-    const bool recordI1 = !(wizType_ == Tsy_DCMwiz::TypeClockSwitching && instNum_ == 2);
-    for (const Output& o : outputs_) {
-        Tsy_Pin* pin = pinOf(o);
-        if (!pin || Rec::HasAnyBufferRecord(pin))
-            continue;
-        const StringBase net = pin->GetSigName();
-        if (net.IsEmpty()) {
-            if (!isClkin(o.pin))
-                pin->AddAttribute(typeRecord(Rec::NextFreeBuffer(pin)), "BUFG");
-            continue;
-        }
-        Tsy_Signal* sig = data_->GetNamedSignal(net);
-        auto addRoute = [&](const char* type) {
-            int n = Rec::NextFreeBuffer(pin);
-            pin->AddAttribute(typeRecord(n), type);
-            // A routed output that was a port keeps its port name.
-            if (sig && sig->IsExternal())
-                pin->AddAttribute(StringBase::Printf(Tsy_Attr::TSY_CLKBUF_N_O_SIGNAME, n), net);
-        };
-        if (sig && sig->GetNamedAttribute(Tsy_Attr::USELOWSKEWLINES))
-            addRoute("LOWSKEWLINE");
-        if (sig && sig->GetNamedAttribute(Tsy_Attr::USELOCALROUTING))
-            addRoute("LOCALROUTING");
-        Tsy_Block* source = blockOf(o);
-        // General Setup may already have stepped every block back; the older
-        // netlist is read whether its blocks are active or not.
-        for (const auto& b : data_->Blocks()) {
-            if (b.get() == source || b->IsTemplate() || b->IsGenerated() || !isBufferBlockType(b->GetType()))
-                continue;
-            const bool mux = Rec::IsMuxType(b->GetType());
-            // A mux belongs to the output on its I0; the one on I1 is named there.
-            const Tsy_Pin* in = b->GetNamedPin(mux ? "I0" : "I");
-            if (!in || in->GetSigName() != net)
-                continue;
-            int n = Rec::NextFreeBuffer(pin);
-            pin->AddAttribute(typeRecord(n), b->GetType());
-            // The nets the user named on the buffer's output, select and
-            // enable pins stay those names.
-            for (const auto& bp : b->Pins()) {
-                const StringBase& name = bp->GetName();
-                if (bp->GetSigName().IsEmpty() || name == "I" || name == "I0" || name == "I1")
-                    continue;
-                pin->AddAttribute(StringBase::Printf(Tsy_Attr::TSY_CLKBUF_N_PORT_SIGNAME, n, name.c_str()),
-                                  bp->GetSigName());
-            }
-            if (mux && recordI1)
-                if (const Tsy_Pin* i1 = b->GetNamedPin("I1"); i1 && !i1->GetSigName().IsEmpty())
-                    for (const Output& other : outputs_) {
-                        const Tsy_Pin* op = pinOf(other);
-                        if (op && &other != &o && op->GetSigName() == i1->GetSigName()) {
-                            pin->AddAttribute(StringBase::Printf(Tsy_Attr::TSY_CLKBUF_N_I1_PINNAME, n), other.shown);
-                            break;
-                        }
-                    }
-            // Its place in the netlist is now recorded on the pin; Finish
-            // builds it anew from there.
-            b->active = false;
-        }
-    }
+    for (const Output& o : outputs_)
+        convertLegacyOutput(o);
     if (pmcdMode_ == "PARALLEL")
         for (const Output& o : outputs_)
             if (const Tsy_Pin* pin = pinOf(o); pin && !pin->GetSigName().IsEmpty())
                 if (Tsy_Signal* sig = data_->GetNamedSignal(pin->GetSigName()))
                     sig->RemoveAttribute(Tsy_Attr::ASSOC_WITH);
+}
+
+// Older versions kept the buffers in the netlist itself, not as records on
+// the output pins.
+bool Tsy_ClockBufDlgGui::isLegacyConversionDue(bool reload) const
+{
+    if (leftByBack_ || mode_ != ModeCustomize || !wiz_ || !wiz_->IsLoadedDesign() || !data_)
+        return false;
+    if (wizType_ == Tsy_DCMwiz::TypePll || wizType_ == Tsy_DCMwiz::TypeDcmToPll || wizType_ == Tsy_DCMwiz::TypePllToDcm)
+        return false;
+    const StringBase& version = wiz_->GetDesignVersion();
+    StringBase v = version.Left(3);
+    if (v == "6.3" && wizType_ == Tsy_DCMwiz::TypeBoardDeskew)
+        return true;
+    if (version.IsEmpty() || v == "6.1" || v == "6.2")
+        return wizType_ == Tsy_DCMwiz::TypeClockSwitching ? v == "6.2" : reload;
+    return false;
+}
+
+void Tsy_ClockBufDlgGui::convertLegacyOutput(const Output& o)
+{
+    Tsy_Pin* pin = pinOf(o);
+    if (!pin || Rec::HasAnyBufferRecord(pin))
+        return;
+    const StringBase net = pin->GetSigName();
+    if (net.IsEmpty()) {
+        if (!isClkin(o.pin))
+            pin->AddAttribute(typeRecord(Rec::NextFreeBuffer(pin)), "BUFG");
+        return;
+    }
+    Tsy_Signal* sig = data_->GetNamedSignal(net);
+    if (sig && sig->GetNamedAttribute(Tsy_Attr::USELOWSKEWLINES))
+        recordRouting(pin, sig, net, "LOWSKEWLINE");
+    if (sig && sig->GetNamedAttribute(Tsy_Attr::USELOCALROUTING))
+        recordRouting(pin, sig, net, "LOCALROUTING");
+    Tsy_Block* source = blockOf(o);
+    // General Setup may already have stepped every block back; the older
+    // netlist is read whether its blocks are active or not.
+    for (const auto& b : data_->Blocks())
+        if (b.get() != source && isLegacyBufferOn(*b, net))
+            recordLegacyBuffer(o, pin, *b);
+}
+
+void Tsy_ClockBufDlgGui::recordRouting(Tsy_Pin* pin, const Tsy_Signal* sig, const StringBase& net, const char* type)
+{
+    int n = Rec::NextFreeBuffer(pin);
+    pin->AddAttribute(typeRecord(n), type);
+    // A routed output that was a port keeps its port name.
+    if (sig->IsExternal())
+        pin->AddAttribute(StringBase::Printf(Tsy_Attr::TSY_CLKBUF_N_O_SIGNAME, n), net);
+}
+
+// A buffer block of the older netlist that the net feeds. A mux belongs to
+// the output on its I0; the one on I1 is named there.
+bool Tsy_ClockBufDlgGui::isLegacyBufferOn(const Tsy_Block& b, const StringBase& net) const
+{
+    if (b.IsTemplate() || b.IsGenerated() || !isBufferBlockType(b.GetType()))
+        return false;
+    const Tsy_Pin* in = b.GetNamedPin(Rec::IsMuxType(b.GetType()) ? "I0" : "I");
+    return in && in->GetSigName() == net;
+}
+
+void Tsy_ClockBufDlgGui::recordLegacyBuffer(const Output& o, Tsy_Pin* pin, Tsy_Block& b)
+{
+    int n = Rec::NextFreeBuffer(pin);
+    pin->AddAttribute(typeRecord(n), b.GetType());
+    // The nets the user named on the buffer's output, select and enable
+    // pins stay those names.
+    for (const auto& bp : b.Pins()) {
+        const StringBase& name = bp->GetName();
+        if (bp->GetSigName().IsEmpty() || name == "I" || name == "I0" || name == "I1")
+            continue;
+        pin->AddAttribute(StringBase::Printf(Tsy_Attr::TSY_CLKBUF_N_PORT_SIGNAME, n, name.c_str()), bp->GetSigName());
+    }
+    const bool recordI1 = !(wizType_ == Tsy_DCMwiz::TypeClockSwitching && instNum_ == 2);
+    if (Rec::IsMuxType(b.GetType()) && recordI1)
+        recordLegacyMuxI1(o, pin, n, b);
+    // Its place in the netlist is now recorded on the pin; Finish
+    // builds it anew from there.
+    b.active = false;
+}
+
+void Tsy_ClockBufDlgGui::recordLegacyMuxI1(const Output& o, Tsy_Pin* pin, int n, const Tsy_Block& mux)
+{
+    const Tsy_Pin* i1 = mux.GetNamedPin("I1");
+    if (!i1 || i1->GetSigName().IsEmpty())
+        return;
+    for (const Output& other : outputs_) {
+        const Tsy_Pin* op = pinOf(other);
+        if (op && &other != &o && op->GetSigName() == i1->GetSigName()) {
+            pin->AddAttribute(StringBase::Printf(Tsy_Attr::TSY_CLKBUF_N_I1_PINNAME, n), other.shown);
+            return;
+        }
+    }
 }
 
 // ---------------------------------------------------------------- store and checks

@@ -22,6 +22,7 @@ class Tsy_ClockBufDlgUI;
 class Tsy_DCMwiz;
 class Tsy_EditBufDlgGui;
 class Tsy_Pin;
+class Tsy_Signal;
 class Tsy_WizData;
 
 class Tsy_ClockBufDlgGui : public Gq_WizardPage {
@@ -127,6 +128,26 @@ private:
     void readPmcdMode();
     void buildOutputList();
     void defaultPass(bool dcmRules);
+    bool takesNoDefaultRow(const Output& o) const;
+    bool closesFeedbackLoop(const Output& o, bool internal) const;
+    // Fills row r with a buffer of output o; returns the next row.
+    int takeRow(int r, const StringBase& type, int n, const StringBase& i0, const StringBase& i1, int state,
+                const Output& o);
+    // The default pass fills the rows from row 1 (globalBufferRows,
+    // recordedBufferRows) or from row r; each returns the first row it left
+    // free. internal: the DCM's feedback loop is closed inside the design.
+    int globalBufferRows(bool internal);
+    int recordedBufferRows(bool internal);
+    int recordedRowsOf(const Output& o, Tsy_Pin* pin, bool internal, int r);
+    int defaultRowOf(const Output& o, Tsy_Pin* pin, bool internal, int r);
+    StringBase shownFirstInput(const Output& o, const Tsy_Pin* pin, const StringBase& type, int state) const;
+    // Legacy designs: buffer blocks and marked nets become buffer records.
+    bool isLegacyConversionDue(bool reload) const;
+    void convertLegacyOutput(const Output& o);
+    void recordRouting(Tsy_Pin* pin, const Tsy_Signal* sig, const StringBase& net, const char* type);
+    bool isLegacyBufferOn(const Tsy_Block& b, const StringBase& net) const;
+    void recordLegacyBuffer(const Output& o, Tsy_Pin* pin, Tsy_Block& b);
+    void recordLegacyMuxI1(const Output& o, Tsy_Pin* pin, int n, const Tsy_Block& mux);
     void dropExtraBuffers(Tsy_Pin* pin);
     void reportOverflow(const StringBase& output);
     bool internalFeedback() const;

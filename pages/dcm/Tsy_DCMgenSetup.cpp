@@ -616,8 +616,31 @@ bool Tsy_DCMgenSetup::StoreToBlock(bool validate)
     Tsy_Block* block = GetActiveDCMBlk(GetInstNum(), true);
     if (!block)
         return false;
+    settleDerivedSettings();
+    if (validate) {
+        if (!ValidatePage(block))
+            return false;
+    } else {
+        ComputeFrequencyModes(s_.clkinText, s_.pins[PinCLK2X] || s_.pins[PinCLK2X180], s_.units);
+    }
+    activateBlock(block);
+    storeInputFrequency(block);
+    storeOutputShaping(block);
+    storeClockSources(block);
+    storeStartupOptions(block);
+    if (gen45_)
+        storeGeneration45Options(block);
+    block->SetAttributeValue(Tsy_Attr::TESY_ONLY_RESET_LOGIC, boolText(s_.resetLogic));
+    storeFrequencyModes(block);
+    storeFamilyAttributes(block);
+    storePins(block);
+    storeFeedbackMarks(block);
+    return true;
+}
 
-    // The pins that follow from other settings.
+// The pins and values that follow from other settings.
+void Tsy_DCMgenSetup::settleDerivedSettings()
+{
     const bool dynamicPs = s_.psType != PsNone && s_.psType != PsFixed;
     s_.pins[PinPSEN] = s_.pins[PinPSINCDEC] = s_.pins[PinPSCLK] = s_.pins[PinPSDONE] = dynamicPs;
     s_.pins[PinCLKFB] = s_.fbSource != FbSourceNone;
@@ -625,68 +648,87 @@ bool Tsy_DCMgenSetup::StoreToBlock(bool validate)
         s_.fbValue = FbValue1X;
     if (!IsResetLogicAllowed())
         s_.resetLogic = false;
+}
 
-    if (validate) {
-        if (!ValidatePage(block))
-            return false;
-    } else {
-        ComputeFrequencyModes(s_.clkinText, s_.pins[PinCLK2X] || s_.pins[PinCLK2X180], s_.units);
-    }
-
-    Tsy_WizData* data = GetWizData();
-    Tsy_DCMwiz* wiz = GetDCMWiz();
+void Tsy_DCMgenSetup::activateBlock(Tsy_Block* block)
+{
+    // In a single-DCM design Finish builds the rest of the netlist anew
+    // around this block.
     if (wizType_ == Tsy_DCMwiz::TypeDcm) {
+        Tsy_WizData* data = GetWizData();
         data->SetAllBlksIsActive(false);
         data->SetAllSigsIsActive(false);
     }
     block->active = true;
+}
 
-    auto set = [block](const char* name, const StringBase& value) { block->SetAttributeValue(name, value); };
-
-    set(Tsy_Attr::CLKIN_PERIOD, ClkinPeriodText(s_.clkinText, s_.units, s_.divideBy2));
-    set(Tsy_Attr::TESY_ONLY_CLKIN_VALUE, s_.clkinText);
+void Tsy_DCMgenSetup::storeInputFrequency(Tsy_Block* block)
+{
+    block->SetAttributeValue(Tsy_Attr::CLKIN_PERIOD, ClkinPeriodText(s_.clkinText, s_.units, s_.divideBy2));
+    block->SetAttributeValue(Tsy_Attr::TESY_ONLY_CLKIN_VALUE, s_.clkinText);
     const char* units = s_.units == UnitsMHz ? "MHZ" : "NS";
-    set(Tsy_Attr::FIN_UNITS, units);
-    if (!wiz->IsLoadedDesign())
-        set(Tsy_Attr::FOUT_UNITS, units);
-    set(Tsy_Attr::CLKDV_DIVIDE, s_.clkdvDivide);
-    set(Tsy_Attr::CLKOUT_PHASE_SHIFT, s_.psType == PsUnknown ? s_.psTypeText : StringBase(PsTypeName(s_.psType)));
+    block->SetAttributeValue(Tsy_Attr::FIN_UNITS, units);
+    if (!GetDCMWiz()->IsLoadedDesign())
+        block->SetAttributeValue(Tsy_Attr::FOUT_UNITS, units);
+}
+
+// The CLKDV divider, the phase shift and the duty-cycle correction.
+void Tsy_DCMgenSetup::storeOutputShaping(Tsy_Block* block)
+{
+    block->SetAttributeValue(Tsy_Attr::CLKDV_DIVIDE, s_.clkdvDivide);
+    block->SetAttributeValue(Tsy_Attr::CLKOUT_PHASE_SHIFT,
+                             s_.psType == PsUnknown ? s_.psTypeText : StringBase(PsTypeName(s_.psType)));
     int psValue = 0;
-    set(Tsy_Attr::PHASE_SHIFT, UT_STR::ParseInt(s_.psValue, psValue) ? StringBase::Printf("%d", psValue) : s_.psValue);
+    block->SetAttributeValue(Tsy_Attr::PHASE_SHIFT,
+                             UT_STR::ParseInt(s_.psValue, psValue) ? StringBase::Printf("%d", psValue) : s_.psValue);
+    block->SetAttributeValue(Tsy_Attr::DUTY_CYCLE_CORRECTION, boolText(s_.dutyCycle));
+}
 
-    set(Tsy_Attr::DUTY_CYCLE_CORRECTION, boolText(s_.dutyCycle));
+// Where the feedback and the input clock come from, and how they arrive.
+void Tsy_DCMgenSetup::storeClockSources(Tsy_Block* block)
+{
     if (s_.fbSource == FbSourceNone) {
-        set(Tsy_Attr::FB_SOURCE, "NONE");
-        set(Tsy_Attr::CLK_FEEDBACK, "NONE");
+        block->SetAttributeValue(Tsy_Attr::FB_SOURCE, "NONE");
+        block->SetAttributeValue(Tsy_Attr::CLK_FEEDBACK, "NONE");
     } else {
-        set(Tsy_Attr::FB_SOURCE, s_.fbSource == FbSourceInternal ? "INTERNAL" : "EXTERNAL");
-        set(Tsy_Attr::CLK_FEEDBACK, s_.fbValue == FbValue2X ? "2X" : "1X");
+        block->SetAttributeValue(Tsy_Attr::FB_SOURCE, s_.fbSource == FbSourceInternal ? "INTERNAL" : "EXTERNAL");
+        block->SetAttributeValue(Tsy_Attr::CLK_FEEDBACK, s_.fbValue == FbValue2X ? "2X" : "1X");
     }
-    set(Tsy_Attr::TESY_ONLY_FB_EXTERNAL, s_.fbDifferential ? "DIFFERENTIAL" : "SINGLE");
-    set(Tsy_Attr::CLKIN_SRC_TYPE, s_.clkinInternal ? "INTERNAL" : "EXTERNAL");
-    set(Tsy_Attr::TESY_ONLY_CLKIN_EXTERNAL, s_.clkinDifferential ? "DIFFERENTIAL" : "SINGLE");
-    set(Tsy_Attr::CLKIN_DIVIDE_BY_2, boolText(s_.divideBy2));
-    set(Tsy_Attr::STARTUP_WAIT, boolText(s_.startupWait));
-    set(Tsy_Attr::DESKEW_ADJUST, s_.deskewAdjust);
+    block->SetAttributeValue(Tsy_Attr::TESY_ONLY_FB_EXTERNAL, s_.fbDifferential ? "DIFFERENTIAL" : "SINGLE");
+    block->SetAttributeValue(Tsy_Attr::CLKIN_SRC_TYPE, s_.clkinInternal ? "INTERNAL" : "EXTERNAL");
+    block->SetAttributeValue(Tsy_Attr::TESY_ONLY_CLKIN_EXTERNAL, s_.clkinDifferential ? "DIFFERENTIAL" : "SINGLE");
+    block->SetAttributeValue(Tsy_Attr::CLKIN_DIVIDE_BY_2, boolText(s_.divideBy2));
+}
+
+void Tsy_DCMgenSetup::storeStartupOptions(Tsy_Block* block)
+{
+    block->SetAttributeValue(Tsy_Attr::STARTUP_WAIT, boolText(s_.startupWait));
+    block->SetAttributeValue(Tsy_Attr::DESKEW_ADJUST, s_.deskewAdjust);
     static const char* const outputTypes[] = {"", "DLL", "FX", "DLL_AND_FX"};
-    set(Tsy_Attr::TSY_CLK_OUTPUT_TYPE, outputTypes[GetOutputType()]);
+    block->SetAttributeValue(Tsy_Attr::TSY_CLK_OUTPUT_TYPE, outputTypes[GetOutputType()]);
+}
 
-    if (gen45_) {
-        if (s_.pmcdAvailable && !s_.pmcdSelected)
-            set(Tsy_Attr::TESY_ONLY_PMCD, "NONE");
-        else if (s_.pmcdSelected && !s_.pmcdMode.EqualsNoCase("SINGLE") && !s_.pmcdMode.EqualsNoCase("PARALLEL"))
-            set(Tsy_Attr::TESY_ONLY_PMCD, "SINGLE");
-        set(Tsy_Attr::DCM_AUTOCALIBRATION, "TRUE");
-        set(Tsy_Attr::TESY_ONLY_RECONFIG_PINS, boolText(s_.reconfigPins));
-        set(Tsy_Attr::DCM_PERFORMANCE_MODE, s_.perfMode == PerfMaxRange ? "MAX_RANGE" : "MAX_SPEED");
-    }
-    set(Tsy_Attr::TESY_ONLY_RESET_LOGIC, boolText(s_.resetLogic));
+void Tsy_DCMgenSetup::storeGeneration45Options(Tsy_Block* block)
+{
+    if (s_.pmcdAvailable && !s_.pmcdSelected)
+        block->SetAttributeValue(Tsy_Attr::TESY_ONLY_PMCD, "NONE");
+    else if (s_.pmcdSelected && !s_.pmcdMode.EqualsNoCase("SINGLE") && !s_.pmcdMode.EqualsNoCase("PARALLEL"))
+        block->SetAttributeValue(Tsy_Attr::TESY_ONLY_PMCD, "SINGLE");
+    block->SetAttributeValue(Tsy_Attr::DCM_AUTOCALIBRATION, "TRUE");
+    block->SetAttributeValue(Tsy_Attr::TESY_ONLY_RECONFIG_PINS, boolText(s_.reconfigPins));
+    block->SetAttributeValue(Tsy_Attr::DCM_PERFORMANCE_MODE, s_.perfMode == PerfMaxRange ? "MAX_RANGE" : "MAX_SPEED");
+}
 
+void Tsy_DCMgenSetup::storeFrequencyModes(Tsy_Block* block)
+{
     const char* dfsMode = dfsMode_ == 2 ? "HIGH" : "LOW";
-    set(Tsy_Attr::DLL_FREQUENCY_MODE, dllMode_ == 2 ? "HIGH" : "LOW");
-    set(Tsy_Attr::DFS_FREQUENCY_MODE, dfsMode);
-    set(Tsy_Attr::TESY_ONLY_VALID_DFS_MODE, dfsMode_ == 3 ? "BOTH" : dfsMode);
+    block->SetAttributeValue(Tsy_Attr::DLL_FREQUENCY_MODE, dllMode_ == 2 ? "HIGH" : "LOW");
+    block->SetAttributeValue(Tsy_Attr::DFS_FREQUENCY_MODE, dfsMode);
+    block->SetAttributeValue(Tsy_Attr::TESY_ONLY_VALID_DFS_MODE, dfsMode_ == 3 ? "BOTH" : dfsMode);
+}
 
+void Tsy_DCMgenSetup::storeFamilyAttributes(Tsy_Block* block)
+{
     const char* jf;
     if (Tsy_Family::IsMembra3(family_))
         jf = "16'h8080";
@@ -697,10 +739,6 @@ bool Tsy_DCMgenSetup::StoreToBlock(bool validate)
     block->AddAttribute(Tsy_Attr::FACTORY_JF, jf);
     if (Tsy_Family::Is(family_, "taldor5"))
         block->AddAttribute(Tsy_Attr::SIM_DEVICE, "TALDOR5");
-
-    storePins(block);
-    storeFeedbackMarks(block);
-    return true;
 }
 
 void Tsy_DCMgenSetup::storePins(Tsy_Block* block)

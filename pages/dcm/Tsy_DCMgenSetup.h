@@ -163,8 +163,23 @@ private:
     void readSettings(Tsy_Block* block);
     void deriveSecondInput(Tsy_Block* block);
     void tidyBlock(Tsy_Block* block);
+    // The steps of StoreToBlock, in the order it takes them.
+    void settleDerivedSettings();
+    void activateBlock(Tsy_Block* block);
+    void storeInputFrequency(Tsy_Block* block);
+    void storeOutputShaping(Tsy_Block* block);
+    void storeClockSources(Tsy_Block* block);
+    void storeStartupOptions(Tsy_Block* block);
+    void storeGeneration45Options(Tsy_Block* block);
+    void storeFrequencyModes(Tsy_Block* block);
+    void storeFamilyAttributes(Tsy_Block* block);
     void storePins(Tsy_Block* block);
     void storeFeedbackMarks(Tsy_Block* block);
+    // CheckInstanceName's steps.
+    void renameFromPrimitiveName(Tsy_Block* block);
+    StringBase freeInstanceName(const StringBase& wanted, const Tsy_Block* block) const;
+    bool checkInstanceNameIsLegal(Tsy_Block* block);
+    void warnIfModuleNamedAfterPrimitive();
     bool checkListValues();
     bool checkFrequencyModes();
     bool checkFeedback();
@@ -177,6 +192,11 @@ private:
     int ask(const StringBase& question, int batchAnswer);
     float speed(const char* keyPattern, const char* fill);
     StringBase rangeLine(const char* format, float min, float max) const;
+    // ReportFrequencyRanges' message: the reason, then the valid ranges.
+    bool isMaxRangeMode() const;
+    StringBase rangeReportReason(int reportCase) const;
+    StringBase outOfRangeReason() const;
+    StringBase rangeReportFigures(int reportCase) const;
 
     int wizType_;
     StringBase family_;

@@ -231,19 +231,42 @@ void Tsy_DCMgenSetupGui::ApplyToGui()
     if (!form_)
         return;
     updating_ = true;
-    Tsy_DCMgenSetupUI_Imp* f = form_;
-    Page::Settings& s = page_->GetSettings();
-    const int wizType = page_->GetWizTypeOfPage();
-
-    // What the page's rules force is selected in the settings as well.
     const StringBase feedback = page_->FeedbackOutput();
+    forceRequiredPins(feedback);
+    // Held until the whole form shows the settings.
+    const QSignalBlocker blockEdit(form_->LineEditFin);
+    applyInputFrequency();
+    applyInputSource();
+    applyFeedback();
+    applyPinBoxes(feedback);
+    applyOutputOptions();
+    applyPhaseShift();
+    applySymbol();
+    updating_ = false;
+}
+
+// An output the page's rules reserve, or the one that closes the feedback
+// loop, runs whatever the user chose.
+bool Tsy_DCMgenSetupGui::isOutputForced(int pin, const StringBase& feedback) const
+{
+    return page_->IsReservedOutput(pin) || (!feedback.IsEmpty() && feedback == Page::PinName(pin));
+}
+
+// What the page's rules force is selected in the settings as well.
+void Tsy_DCMgenSetupGui::forceRequiredPins(const StringBase& feedback)
+{
+    Page::Settings& s = page_->GetSettings();
     for (const auto& o : kOutputs)
-        if (page_->IsReservedOutput(o.pin) || (!feedback.IsEmpty() && feedback == Page::PinName(o.pin)))
+        if (isOutputForced(o.pin, feedback))
             s.pins[o.pin] = true;
     if (isRstForced())
         s.pins[Page::PinRST] = true;
+}
 
-    const QSignalBlocker blockEdit(f->LineEditFin);
+void Tsy_DCMgenSetupGui::applyInputFrequency()
+{
+    Tsy_DCMgenSetupUI_Imp* f = form_;
+    const Page::Settings& s = page_->GetSettings();
     if (f->LineEditFin->text() != qs(s.clkinText))
         f->LineEditFin->setText(qs(s.clkinText));
     f->LineEditFin->setEnabled(!page_->IsInputDerived());
@@ -252,35 +275,52 @@ void Tsy_DCMgenSetupGui::ApplyToGui()
     f->RadioFinMhz->setEnabled(!page_->AreUnitsDerived());
     f->RadioFinNs->setEnabled(!page_->AreUnitsDerived());
     f->TextLabelFinDivided->setVisible(s.divideBy2);
+}
 
-    const bool sources = userChoosesSources(wizType);
-    f->GroupBoxClkinSrc->setEnabled(sources);
+void Tsy_DCMgenSetupGui::applyInputSource()
+{
+    Tsy_DCMgenSetupUI_Imp* f = form_;
+    const Page::Settings& s = page_->GetSettings();
+    f->GroupBoxClkinSrc->setEnabled(userChoosesSources(page_->GetWizTypeOfPage()));
     f->RadioClkinExternal->setChecked(!s.clkinInternal);
     f->RadioClkinInternal->setChecked(s.clkinInternal);
     f->RadioClkinSingle->setChecked(!s.clkinDifferential);
     f->RadioClkinDifferential->setChecked(s.clkinDifferential);
     f->RadioClkinSingle->setEnabled(!s.clkinInternal);
     f->RadioClkinDifferential->setEnabled(!s.clkinInternal);
+}
 
+void Tsy_DCMgenSetupGui::applyFeedback()
+{
+    Tsy_DCMgenSetupUI_Imp* f = form_;
+    const Page::Settings& s = page_->GetSettings();
+    const bool sources = userChoosesSources(page_->GetWizTypeOfPage());
+    const bool external = s.fbSource == Page::FbSourceExternal;
     f->GroupBoxFbSrc->setEnabled(sources);
-    f->RadioFbExternal->setChecked(s.fbSource == Page::FbSourceExternal);
+    f->RadioFbExternal->setChecked(external);
     f->RadioFbInternal->setChecked(s.fbSource == Page::FbSourceInternal);
     f->RadioFbNone->setChecked(s.fbSource == Page::FbSourceNone);
     f->RadioFbSingle->setChecked(!s.fbDifferential);
     f->RadioFbDifferential->setChecked(s.fbDifferential);
-    f->RadioFbSingle->setEnabled(s.fbSource == Page::FbSourceExternal);
-    f->RadioFbDifferential->setEnabled(s.fbSource == Page::FbSourceExternal);
+    f->RadioFbSingle->setEnabled(external);
+    f->RadioFbDifferential->setEnabled(external);
     f->GroupBoxFbValue->setEnabled(sources && s.fbSource != Page::FbSourceNone);
     f->RadioFb1x->setChecked(s.fbValue != Page::FbValue2X);
     f->RadioFb2x->setChecked(s.fbValue == Page::FbValue2X);
     f->RadioFb2x->setEnabled(!page_->Is2XFeedbackRefused());
+}
 
+// RST and the output boxes beside the symbol; a forced one cannot be cleared.
+void Tsy_DCMgenSetupGui::applyPinBoxes(const StringBase& feedback)
+{
+    Tsy_DCMgenSetupUI_Imp* f = form_;
+    const Page::Settings& s = page_->GetSettings();
     f->CheckBoxRST->setChecked(s.pins[Page::PinRST]);
     f->CheckBoxRST->setEnabled(!isRstForced() && !isRstBlocked());
     for (const auto& o : kOutputs) {
         QCheckBox* box = f->*o.box;
         box->setChecked(s.pins[o.pin]);
-        bool fixed = page_->IsReservedOutput(o.pin) || (!feedback.IsEmpty() && feedback == Page::PinName(o.pin));
+        bool fixed = isOutputForced(o.pin, feedback);
         // DO also carries the read-back data of dynamic reconfiguration.
         if (o.pin == Page::PinSTATUS && page_->IsGeneration45() && s.reconfigPins) {
             box->setChecked(true);
@@ -288,20 +328,21 @@ void Tsy_DCMgenSetupGui::ApplyToGui()
         }
         box->setEnabled(!fixed);
     }
+}
 
+// The CLKDV divider, the duty-cycle correction and the PMCD choice.
+void Tsy_DCMgenSetupGui::applyOutputOptions()
+{
+    Tsy_DCMgenSetupUI_Imp* f = form_;
+    const Page::Settings& s = page_->GetSettings();
     if (f->ComboBoxDivideByValue->count() == 0)
         Tsy_DCMwizPage::FillComboBox(f->ComboBoxDivideByValue,
                                      page_->GetDcmValueList(Tsy_DCMwizPage::ListClkdvDivide));
     if (!Tsy_WizPage::SetComboBoxText(f->ComboBoxDivideByValue, s.clkdvDivide))
         f->ComboBoxDivideByValue->setCurrentIndex(-1);
     f->CheckBoxDutyCycle->setChecked(s.dutyCycle);
-
     f->CheckBoxPmcd->setVisible(page_->IsGeneration45() && s.pmcdAvailable);
     f->CheckBoxPmcd->setChecked(s.pmcdSelected);
-
-    applyPhaseShift();
-    applySymbol();
-    updating_ = false;
 }
 
 void Tsy_DCMgenSetupGui::applyPhaseShift()

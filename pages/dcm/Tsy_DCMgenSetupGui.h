@@ -3,6 +3,7 @@
 // the page's settings, keeps the form's rules and reacts to its controls.
 
 #include "gui/Gq_WizardPage.h"
+#include "port/StringBase.h"
 
 #include <QPointer>
 
@@ -46,6 +47,14 @@ private:
     // The input frequency, the outputs or an Advanced setting changed: the
     // frequency modes, the phase-shift rules and limits follow.
     void recompute(bool warn);
+    // ApplyToGui's steps, in the order it takes them.
+    bool isOutputForced(int pin, const StringBase& feedback) const;
+    void forceRequiredPins(const StringBase& feedback);
+    void applyInputFrequency();
+    void applyInputSource();
+    void applyFeedback();
+    void applyPinBoxes(const StringBase& feedback);
+    void applyOutputOptions();
     void applySymbol();
     void applyPhaseShift();
     bool isRstForced() const;

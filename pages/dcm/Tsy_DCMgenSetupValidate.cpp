@@ -27,6 +27,15 @@ bool isDfs(int outputType)
     return outputType == Tsy_DCMgenSetup::OutputDfs || outputType == Tsy_DCMgenSetup::OutputBoth;
 }
 
+// Begins with a letter and holds nothing but letters, digits and '_'.
+bool isLettersDigitsAndUnderscores(const StringBase& name)
+{
+    bool legal = UT_STR::IsAlpha(name[0]);
+    for (size_t i = 0; legal && i < name.GetLength(); ++i)
+        legal = UT_STR::IsAlpha(name[i]) || UT_STR::IsDigit(name[i]) || name[i] == '_';
+    return legal;
+}
+
 } // namespace
 
 int Tsy_DCMgenSetup::ClassifyFrequency(float f, float lowMin, float lowMax, float highMin, float highMax)
@@ -95,83 +104,95 @@ StringBase Tsy_DCMgenSetup::rangeLine(const char* format, float min, float max) 
 
 void Tsy_DCMgenSetup::ReportFrequencyRanges(int reportCase)
 {
+    if (reportCase < CaseCascadeFirst || reportCase > CaseMaxRange)
+        return;
+    IssueMessage(rangeReportReason(reportCase) + rangeReportFigures(reportCase), true, false, true);
+}
+
+bool Tsy_DCMgenSetup::isMaxRangeMode() const
+{
+    return gen45_ && s_.perfMode == PerfMaxRange;
+}
+
+// Why the input frequency was refused and what to change.
+StringBase Tsy_DCMgenSetup::rangeReportReason(int reportCase) const
+{
+    switch (reportCase) {
+    case CaseCascadeFirst:
+        return "Only Low Frequency mode is valid for Cascading In Series.\n"
+               "Please enter an Input Clock Frequency value within the valid Low Frequency range.\n\n";
+    case CaseCascadeSecond:
+        return "Only Low Frequency mode is valid for Cascading In Series.\n"
+               "The Input Clock Frequency for this DCM is set\n"
+               "using the first DCM's Input Clock Frequency.\n"
+               "Please adjust that value so this DCM's input frequency\n"
+               "falls within the valid Low Frequency range.\n\n";
+    case CaseCascadeSecondClkdv:
+        return "Only Low Frequency mode is valid for Cascading In Series.\n"
+               "The Input Clock Frequency for this DCM is set\n"
+               "using the first DCM's Input Clock Frequency and the CLKDV's Divide-By-Value.\n"
+               "Please adjust those values so this DCM's input frequency falls\n"
+               "within the valid Low Frequency range.\n\n";
+    case CaseMaxRange:
+        return "Only Low Frequency mode is valid when the Performance Mode is set to Max Range.\n"
+               "Please adjust the Performance Mode setting (in the Advanced Dialog)\n"
+               "or change the input frequency to be within the valid Low Frequency range.\n\n";
+    case CaseDll:
+    case CaseDfs:
+    case CaseDllAndDfs:
+        return outOfRangeReason();
+    default:
+        return StringBase();
+    }
+}
+
+// The reason of the DLL and DFS cases, which depends on the performance mode.
+StringBase Tsy_DCMgenSetup::outOfRangeReason() const
+{
+    StringBase text;
+    if (isMaxRangeMode())
+        text = "A valid Input Clock Frequency value is required to continue.\n"
+               "Please enter a value within the valid ranges.\n\n";
+    else
+        text = "A valid Input Clock Frequency value is required to continue.\n"
+               "Please enter a value within the valid ranges.\n"
+               "Note: High Frequency mode is set only after Low Frequency\n"
+               "maximum has been exceeded.\n\n";
+    if (gen45_)
+        text += StringBase::Printf("Performance Mode is set to %s.\n\n",
+                                   isMaxRangeMode() ? "Maximum Range" : "Maximum Speed");
+    return text;
+}
+
+// The valid ranges that apply to the case, in the units of the entry.
+StringBase Tsy_DCMgenSetup::rangeReportFigures(int reportCase) const
+{
     const Ranges& r = ranges_;
     StringBase dllLow = rangeLine("DLL Low Frequency Mode: %3.3f - %3.3f %s\n", r.dllLowMin, r.dllLowMax);
     StringBase dllHigh = rangeLine("DLL High Frequency Mode: %3.3f - %3.3f %s\n", r.dllHighMin, r.dllHighMax);
     StringBase dfsLow = rangeLine("DFS Low Frequency Mode: %3.3f - %3.3f %s\n", r.dfsLowMin, r.dfsLowMax);
     StringBase dfsHigh = rangeLine("DFS High Frequency Mode: %3.3f - %3.3f %s\n", r.dfsHighMin, r.dfsHighMax);
-    const bool maxRange = gen45_ && s_.perfMode == PerfMaxRange;
-
-    StringBase text;
-    switch (reportCase) {
-    case CaseCascadeFirst:
-        text = "Only Low Frequency mode is valid for Cascading In Series.\n"
-               "Please enter an Input Clock Frequency value within the valid Low Frequency range.\n\n";
-        break;
-    case CaseCascadeSecond:
-        text = "Only Low Frequency mode is valid for Cascading In Series.\n"
-               "The Input Clock Frequency for this DCM is set\n"
-               "using the first DCM's Input Clock Frequency.\n"
-               "Please adjust that value so this DCM's input frequency\n"
-               "falls within the valid Low Frequency range.\n\n";
-        break;
-    case CaseCascadeSecondClkdv:
-        text = "Only Low Frequency mode is valid for Cascading In Series.\n"
-               "The Input Clock Frequency for this DCM is set\n"
-               "using the first DCM's Input Clock Frequency and the CLKDV's Divide-By-Value.\n"
-               "Please adjust those values so this DCM's input frequency falls\n"
-               "within the valid Low Frequency range.\n\n";
-        break;
-    case CaseDll:
-    case CaseDfs:
-    case CaseDllAndDfs:
-        if (maxRange)
-            text = "A valid Input Clock Frequency value is required to continue.\n"
-                   "Please enter a value within the valid ranges.\n\n";
-        else
-            text = "A valid Input Clock Frequency value is required to continue.\n"
-                   "Please enter a value within the valid ranges.\n"
-                   "Note: High Frequency mode is set only after Low Frequency\n"
-                   "maximum has been exceeded.\n\n";
-        if (gen45_)
-            text += StringBase::Printf("Performance Mode is set to %s.\n\n",
-                                       maxRange ? "Maximum Range" : "Maximum Speed");
-        break;
-    case CaseMaxRange:
-        text = "Only Low Frequency mode is valid when the Performance Mode is set to Max Range.\n"
-               "Please adjust the Performance Mode setting (in the Advanced Dialog)\n"
-               "or change the input frequency to be within the valid Low Frequency range.\n\n";
-        break;
-    default:
-        return;
-    }
-
+    const StringBase bothLow = dllLow + "\n" + dfsLow;
+    const bool maxRange = isMaxRangeMode();
     const int outputs = GetOutputType();
     switch (reportCase) {
     case CaseCascadeFirst:
     case CaseCascadeSecond:
     case CaseCascadeSecondClkdv:
         if (outputs == OutputDfs)
-            text += dfsLow;
-        else if (outputs == OutputDll)
-            text += dllLow;
-        else
-            text += dllLow + "\n" + dfsLow;
-        break;
+            return dfsLow;
+        return outputs == OutputDll ? dllLow : bothLow;
     case CaseDll:
-        text += maxRange ? dllLow : dllLow + dllHigh;
-        break;
+        return maxRange ? dllLow : dllLow + dllHigh;
     case CaseDfs:
-        text += maxRange ? dfsLow : dfsLow + dfsHigh;
-        break;
+        return maxRange ? dfsLow : dfsLow + dfsHigh;
     case CaseDllAndDfs:
-        text += maxRange ? dllLow + "\n" + dfsLow : dllLow + dllHigh + "\n" + dfsLow + dfsHigh;
-        break;
+        return maxRange ? bothLow : dllLow + dllHigh + "\n" + dfsLow + dfsHigh;
     case CaseMaxRange:
-        text += dllLow + "\n" + dfsLow;
-        break;
+        return bothLow;
+    default:
+        return StringBase();
     }
-    IssueMessage(text, true, false, true);
 }
 
 int Tsy_DCMgenSetup::ask(const StringBase& question, int batchAnswer)
@@ -226,73 +247,80 @@ bool Tsy_DCMgenSetup::CheckInstanceName(Tsy_Block* block)
 {
     if (!block)
         return true;
-    Tsy_WizData* data = GetWizData();
-    const StringBase& current = block->GetName();
-    if (current.EqualsNoCase("DCM") || current.EqualsNoCase("DCM_ADV")) {
-        StringBase prim = gen45_ ? "DCM_ADV" : "DCM";
-        StringBase wanted = StringBase::Printf("%s_INST", prim.c_str());
-        // Another block may hold the name already (a template, say); then
-        // the next free numbered name is taken, as generation names blocks.
-        StringBase name = wanted;
-        for (int i = 1; i <= 99 && data; ++i) {
-            const Tsy_Block* holder = data->GetNamedBlock(name);
-            if (!holder || holder == block)
-                break;
-            name = StringBase::Printf("%s%d", wanted.c_str(), i);
-        }
-        if (name == wanted)
-            IssueMessage(StringBase::Printf("The specified DCM Instance Name is the same as the primitive name'%s'.  "
-                                            "Since this is not allowed, the instance name will be changed to "
-                                            "'%s_INST'.",
-                                            prim.c_str(), prim.c_str()),
-                         false, false, false);
-        else
-            IssueMessage(StringBase::Printf("The specified DCM Instance Name is the same as the primitive name'%s'.  "
-                                            "Since this is not allowed, the instance name will be changed to '%s'.",
-                                            prim.c_str(), name.c_str()),
-                         false, false, false);
-        block->SetName(name);
-    }
+    if (block->GetName().EqualsNoCase("DCM") || block->GetName().EqualsNoCase("DCM_ADV"))
+        renameFromPrimitiveName(block);
+    bool ok = checkInstanceNameIsLegal(block);
+    warnIfModuleNamedAfterPrimitive();
+    return ok;
+}
 
+void Tsy_DCMgenSetup::renameFromPrimitiveName(Tsy_Block* block)
+{
+    StringBase prim = gen45_ ? "DCM_ADV" : "DCM";
+    StringBase name = freeInstanceName(StringBase::Printf("%s_INST", prim.c_str()), block);
+    IssueMessage(StringBase::Printf("The specified DCM Instance Name is the same as the primitive name'%s'.  "
+                                    "Since this is not allowed, the instance name will be changed to '%s'.",
+                                    prim.c_str(), name.c_str()),
+                 false, false, false);
+    block->SetName(name);
+}
+
+// Another block may hold the name already (a template, say); then the next
+// free numbered name is taken, as generation names blocks.
+StringBase Tsy_DCMgenSetup::freeInstanceName(const StringBase& wanted, const Tsy_Block* block) const
+{
+    Tsy_WizData* data = GetWizData();
+    StringBase name = wanted;
+    for (int i = 1; i <= 99 && data; ++i) {
+        const Tsy_Block* holder = data->GetNamedBlock(name);
+        if (!holder || holder == block)
+            break;
+        name = StringBase::Printf("%s%d", wanted.c_str(), i);
+    }
+    return name;
+}
+
+// A legal name loses the blanks around it; an illegal one is refused.
+bool Tsy_DCMgenSetup::checkInstanceNameIsLegal(Tsy_Block* block)
+{
     StringBase name = block->GetName();
     name.Trim();
-    bool ok = true;
     if (name.IsEmpty()) {
         IssueMessage("Block has no name specified", true, false, false);
-        ok = false;
-    } else if (UT_STR::IsDigit(name[0])) {
+        return false;
+    }
+    if (UT_STR::IsDigit(name[0])) {
         IssueMessage("The DCM Instance Name cannot begin with a number.  Please specify a valid instance name before "
                      "continuing.",
                      true, false, false);
-        ok = false;
-    } else {
-        bool legal = UT_STR::IsAlpha(name[0]);
-        for (size_t i = 0; legal && i < name.GetLength(); ++i)
-            legal = UT_STR::IsAlpha(name[i]) || UT_STR::IsDigit(name[i]) || name[i] == '_';
-        if (!legal) {
-            IssueMessage("Invalid DCM Instance Name specified.  Please check this before continuing.", true, false,
-                         false);
-            ok = false;
-        } else if (std::string why = Tsy_HdlNameProblem(name.str()); !why.empty()) {
-            // Letters, digits and '_' are not enough for both HDLs: keywords
-            // and doubled or trailing '_' break one of them.
-            IssueMessage(StringBase::Printf("The DCM Instance Name '%s' %s.  Please specify a valid instance name "
-                                            "before continuing.",
-                                            name.c_str(), why.c_str()),
-                         true, false, false);
-            ok = false;
-        } else if (name != block->GetName()) {
-            block->SetName(name);
-        }
+        return false;
     }
+    if (!isLettersDigitsAndUnderscores(name)) {
+        IssueMessage("Invalid DCM Instance Name specified.  Please check this before continuing.", true, false, false);
+        return false;
+    }
+    // Letters, digits and '_' are not enough for both HDLs: keywords and
+    // doubled or trailing '_' break one of them.
+    if (std::string why = Tsy_HdlNameProblem(name.str()); !why.empty()) {
+        IssueMessage(StringBase::Printf("The DCM Instance Name '%s' %s.  Please specify a valid instance name "
+                                        "before continuing.",
+                                        name.c_str(), why.c_str()),
+                     true, false, false);
+        return false;
+    }
+    if (name != block->GetName())
+        block->SetName(name);
+    return true;
+}
 
+void Tsy_DCMgenSetup::warnIfModuleNamedAfterPrimitive()
+{
     Tsy_DCMwiz* wiz = GetDCMWiz();
     if (wiz && wiz->GetModuleName().EqualsNoCase(wiz->GetDCMPrimName()))
         IssueMessage(StringBase::Printf("The module name '%s' is the same as a library primitive name of an instance in "
                                         "this module.  This may cause errors during synthesis.",
                                         wiz->GetModuleName().c_str()),
                      false, false, false);
-    return ok;
 }
 
 // Values that reach the primitive must be ones it knows; only a design file
