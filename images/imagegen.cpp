@@ -13,20 +13,20 @@
 
 namespace {
 
-QByteArray bmpOf(const PictureSpec& spec)
+QByteArray bmpOf(const PictureSpec& picture)
 {
-    QImage canvas(spec.width, spec.height, QImage::Format_RGB32);
+    QImage canvas(picture.width, picture.height, QImage::Format_RGB32);
     canvas.fill(Qt::white);
     {
         QPainter p(&canvas);
-        p.setRenderHint(QPainter::Antialiasing, spec.depth > 8);
-        spec.draw(p, canvas.size());
+        p.setRenderHint(QPainter::Antialiasing, picture.depth > 8);
+        picture.draw(p, canvas.size());
     }
-    QImage stored = spec.depth == 8 ? canvas.convertToFormat(QImage::Format_Indexed8, Qt::ThresholdDither)
-                                    : canvas.convertToFormat(QImage::Format_RGB888);
+    QImage stored = picture.depth == 8 ? canvas.convertToFormat(QImage::Format_Indexed8, Qt::ThresholdDither)
+                                       : canvas.convertToFormat(QImage::Format_RGB888);
     // The BMP writer stores a picture of sixteen colours or fewer with four
     // bits a pixel; a full palette keeps every 8-bit picture at 8 bits.
-    if (spec.depth == 8 && stored.colorCount() <= 16) {
+    if (picture.depth == 8 && stored.colorCount() <= 16) {
         QVector<QRgb> palette = stored.colorTable();
         palette.resize(256, qRgb(0, 0, 0));
         stored.setColorTable(palette);
