@@ -238,11 +238,6 @@ void Tsy_Block::SetAllPinsIsActive(bool on)
         p->SetIsActive(on);
 }
 
-static bool isWizardAttribute(const StringBase& name)
-{
-    return name.StartsWith("TESY_ONLY_") || name.StartsWith("TSY_");
-}
-
 void Tsy_Block::Retype(const StringBase& type, const Tsy_PrimitiveDef* def)
 {
     type_ = type;
@@ -251,7 +246,7 @@ void Tsy_Block::Retype(const StringBase& type, const Tsy_PrimitiveDef* def)
     for (const auto& a : Attributes()) {
         const Tsy_AttrDef* ad = DefinitionOf(a->GetName());
         a->SetDef(ad);
-        if (!ad && !isWizardAttribute(a->GetName()))
+        if (!ad && !Tsy_IsWizardAttributeName(a->GetName().str()))
             dropped.push_back(a->GetName());
     }
     for (const auto& name : dropped)

@@ -54,14 +54,14 @@ const std::set<std::string>& vhdlKeywords()
     return words;
 }
 
-std::string lower(const std::string& s)
+} // namespace
+
+std::string Tsy_HdlFoldCase(const std::string& name)
 {
-    std::string out = s;
+    std::string out = name;
     std::transform(out.begin(), out.end(), out.begin(), [](unsigned char c) { return std::tolower(c); });
     return out;
 }
-
-} // namespace
 
 std::string Tsy_HdlNameProblem(const std::string& name)
 {
@@ -78,7 +78,7 @@ std::string Tsy_HdlNameProblem(const std::string& name)
         return "must not hold two '_' in a row (VHDL)";
     if (name.size() > 200)
         return "is longer than 200 characters";
-    std::string l = lower(name);
+    std::string l = Tsy_HdlFoldCase(name);
     if (verilogKeywords().count(name) || verilogKeywords().count(l))
         return "is a Verilog keyword";
     if (vhdlKeywords().count(l))

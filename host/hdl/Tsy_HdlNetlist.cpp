@@ -2,6 +2,7 @@
 
 #include "db/Tsy_WizData.h"
 #include "hdl/Tsy_HdlNames.h"
+#include "hdl/Tsy_HdlText.h"
 #include "hdl/Tsy_HdlValues.h"
 #include "lib/Tsy_PrimitiveLibrary.h"
 
@@ -17,18 +18,6 @@ const char* const kAssocWith = "ASSOC_WITH";
 // would hide the library, the package or a type the ports are declared with.
 const char* const kVhdlReserved[] = {"ieee",          "std",     "work",      "std_logic", "std_logic_vector",
                                      "std_logic_1164", "bit_vector", "structure"};
-
-std::string lower(const std::string& s)
-{
-    std::string out = s;
-    std::transform(out.begin(), out.end(), out.begin(), [](unsigned char c) { return std::tolower(c); });
-    return out;
-}
-
-bool isWizardAttribute(const std::string& name)
-{
-    return name.rfind("TESY_ONLY_", 0) == 0 || name.rfind("TSY_", 0) == 0;
-}
 
 std::string pinRef(const std::string& instance, const std::string& pin)
 {
@@ -99,10 +88,9 @@ private:
     {
         if (!legal("module name", module_))
             return false;
-        for (const auto& type : data_.Library().Types())
-            if (lower(type) == lower(module_))
-                return fail("The module name \"" + module_ + "\" is the name of the primitive " + type +
-                            "; the two would clash in any design that uses both.");
+        if (const Tsy_PrimitiveDef* clash = data_.Library().FindNoCase(module_))
+            return fail("The module name \"" + module_ + "\" is the name of the primitive " + clash->type +
+                        "; the two would clash in any design that uses both.");
         return true;
     }
 
@@ -143,9 +131,8 @@ private:
 
     bool readParameters(const Tsy_Block& b, Tsy_HdlInstance& inst)
     {
-        for (const auto& ad : inst.def->attributes) {
-            if (!ad.hdl || isWizardAttribute(ad.name))
-                continue;
+        for (const Tsy_AttrDef* def : Tsy_HdlParameterDefs(*inst.def)) {
+            const Tsy_AttrDef& ad = *def;
             const Tsy_Attribute* a = b.GetNamedAttribute(ad.name);
             if (!a || !a->IsActive())
                 continue;
@@ -298,7 +285,7 @@ private:
     {
         for (const auto& a : info.signal->Attributes()) {
             const std::string& n = a->GetName().str();
-            if (!a->IsActive() || n == kAssocWith || isWizardAttribute(n))
+            if (!a->IsActive() || n == kAssocWith || Tsy_IsWizardAttributeName(n))
                 continue;
             if (!legal("attribute name", n))
                 return false;
@@ -355,7 +342,7 @@ private:
 
     bool claim(const std::string& name, const std::string& what, std::map<std::string, std::pair<std::string, std::string>>& seen)
     {
-        auto [it, fresh] = seen.emplace(lower(name), std::make_pair(name, what));
+        auto [it, fresh] = seen.emplace(Tsy_HdlFoldCase(name), std::make_pair(name, what));
         if (fresh)
             return true;
         const auto& [otherName, otherWhat] = it->second;
@@ -402,9 +389,9 @@ private:
 std::string Tsy_HdlNetlist::FreshName(const std::string& base)
 {
     std::string name = base;
-    for (int n = 1; taken.count(lower(name)); ++n)
+    for (int n = 1; taken.count(Tsy_HdlFoldCase(name)); ++n)
         name = base + std::to_string(n);
-    taken.insert(lower(name));
+    taken.insert(Tsy_HdlFoldCase(name));
     return name;
 }
 

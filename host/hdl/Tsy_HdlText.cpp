@@ -3,15 +3,6 @@
 #include "hdl/Tsy_HdlValues.h"
 #include "lib/Tsy_PrimitiveLibrary.h"
 
-namespace {
-
-bool isWizardAttribute(const std::string& name)
-{
-    return name.rfind("TESY_ONLY_", 0) == 0 || name.rfind("TSY_", 0) == 0;
-}
-
-} // namespace
-
 std::string Tsy_HdlCommentBanner(const std::vector<std::string>& banner, const std::string& marker)
 {
     std::string out;
@@ -34,7 +25,7 @@ std::vector<const Tsy_AttrDef*> Tsy_HdlParameterDefs(const Tsy_PrimitiveDef& def
 {
     std::vector<const Tsy_AttrDef*> out;
     for (const auto& ad : def.attributes)
-        if (ad.hdl && !isWizardAttribute(ad.name))
+        if (ad.IsHdlProperty())
             out.push_back(&ad);
     return out;
 }

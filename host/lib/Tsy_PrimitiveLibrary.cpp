@@ -4,6 +4,16 @@
 #include "lib/Tsy_JsonReader.h"
 #include "port/Exception.h"
 
+bool Tsy_IsWizardAttributeName(const std::string& name)
+{
+    return name.rfind("TESY_ONLY_", 0) == 0 || name.rfind("TSY_", 0) == 0;
+}
+
+bool Tsy_AttrDef::IsHdlProperty() const
+{
+    return hdl && !Tsy_IsWizardAttributeName(name);
+}
+
 const Tsy_AttrDef* Tsy_PrimitiveDef::FindAttr(const std::string& name) const
 {
     for (const auto& a : attributes)
@@ -108,6 +118,14 @@ const Tsy_PrimitiveDef* Tsy_PrimitiveLibrary::Find(const std::string& type) cons
 {
     auto it = defs_.find(type);
     return it == defs_.end() ? nullptr : &it->second;
+}
+
+const Tsy_PrimitiveDef* Tsy_PrimitiveLibrary::FindNoCase(const std::string& name) const
+{
+    for (const auto& kv : defs_)
+        if (StringBase(kv.first).EqualsNoCase(name))
+            return &kv.second;
+    return nullptr;
 }
 
 std::vector<std::string> Tsy_PrimitiveLibrary::Types() const

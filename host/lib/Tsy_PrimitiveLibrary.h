@@ -24,7 +24,14 @@ struct Tsy_AttrDef {
     // False for the wizard's own settings kept on a block: they are no
     // property of the primitive and never reach the HDL.
     bool hdl = true;
+
+    // A property of the primitive that the HDL carries as a parameter.
+    bool IsHdlProperty() const;
 };
+
+// Attributes named "TESY_ONLY_..." or "TSY_..." are the wizard's own: they
+// follow a block through conversions and never reach the netlist.
+bool Tsy_IsWizardAttributeName(const std::string& name);
 
 struct Tsy_PinDef {
     std::string name;
@@ -52,6 +59,9 @@ public:
     static std::unique_ptr<Tsy_PrimitiveLibrary> LoadFile(const std::string& path);
 
     const Tsy_PrimitiveDef* Find(const std::string& type) const;
+    // The primitive whose type matches the name without regard to case
+    // (VHDL names ignore case), or null.
+    const Tsy_PrimitiveDef* FindNoCase(const std::string& name) const;
     std::vector<std::string> Types() const;
 
 private:

@@ -20,8 +20,7 @@ QString escaped(const StringBase& s)
 // The wizard's own settings kept on a block are no property of the design.
 bool isWizardPrivate(const Tsy_Attribute& a)
 {
-    const StringBase& name = a.GetName();
-    return name.StartsWith("TESY_ONLY_") || name.StartsWith("TSY_") || (a.GetDef() && !a.GetDef()->hdl);
+    return Tsy_IsWizardAttributeName(a.GetName().str()) || (a.GetDef() && !a.GetDef()->hdl);
 }
 
 // The primitive properties of every active block: what the HDL will carry.
