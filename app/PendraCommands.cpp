@@ -35,12 +35,11 @@ int PendraListWizards()
 {
     try {
         auto catalog = Tsy_WizardCatalog::LoadFile(Tsy_DataFile("wizards.json"));
-        Tsy_PluginLoader loader;
+        // Without the plug-in every type is listed as not available.
         std::string error;
-        std::string path = Tsy_PluginLoader::Locate(catalog->PluginFile());
-        bool loaded = !path.empty() && loader.Load(path, error);
+        const Tsy_PluginLoader* loader = Tsy_PluginLoader::Shared(catalog->PluginFile(), error);
         for (const auto& w : catalog->Wizards()) {
-            bool available = loaded && loader.Create(w.key, true) != nullptr;
+            bool available = loader && loader->Create(w.key, true) != nullptr;
             std::printf("%-15s %s%s\n", w.key.c_str(), w.description.c_str(),
                         available ? "" : " (not available in this build)");
         }

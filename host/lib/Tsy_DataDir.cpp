@@ -10,22 +10,6 @@
 
 namespace {
 
-bool isDirectory(const std::string& path)
-{
-    struct stat st {};
-    return stat(path.c_str(), &st) == 0 && S_ISDIR(st.st_mode);
-}
-
-std::string executableDir()
-{
-    char buf[4096];
-    ssize_t n = readlink("/proc/self/exe", buf, sizeof(buf) - 1);
-    if (n <= 0)
-        return std::string();
-    std::string path(buf, static_cast<size_t>(n));
-    return path.substr(0, path.find_last_of('/'));
-}
-
 // Line and column of a byte offset, for messages that point into the file.
 std::string placeOf(const std::string& text, size_t offset)
 {
@@ -43,12 +27,28 @@ std::string placeOf(const std::string& text, size_t offset)
 
 } // namespace
 
+bool Tsy_IsDirectory(const std::string& path)
+{
+    struct stat st {};
+    return stat(path.c_str(), &st) == 0 && S_ISDIR(st.st_mode);
+}
+
+std::string Tsy_ExecutableDir()
+{
+    char buf[4096];
+    ssize_t n = readlink("/proc/self/exe", buf, sizeof(buf) - 1);
+    if (n <= 0)
+        return std::string();
+    std::string path(buf, static_cast<size_t>(n));
+    return path.substr(0, path.find_last_of('/'));
+}
+
 std::string Tsy_DataDir()
 {
     if (const char* env = std::getenv("PENDRA_DATA_DIR"); env && *env)
         return env;
-    std::string installed = executableDir() + "/../share/pendra";
-    if (isDirectory(installed))
+    std::string installed = Tsy_ExecutableDir() + "/../share/pendra";
+    if (Tsy_IsDirectory(installed))
         return installed;
     return PENDRA_SOURCE_DATA_DIR;
 }
@@ -75,7 +75,7 @@ nlohmann::ordered_json Tsy_ParseJson(const std::string& text, const std::string&
 nlohmann::ordered_json Tsy_ReadJsonFile(const std::string& path)
 {
     std::ifstream in(path, std::ios::binary);
-    if (!in || isDirectory(path))
+    if (!in || Tsy_IsDirectory(path))
         throw Port::Exception(path + ": cannot be read");
     std::ostringstream text;
     text << in.rdbuf();

@@ -8,6 +8,9 @@
 // live: $PENDRA_DATA_DIR, else share/pendra beside the installed program,
 // else the source tree's data/ directory.
 std::string Tsy_DataDir();
+// The folder of the running program, empty when it cannot be told.
+std::string Tsy_ExecutableDir();
+bool Tsy_IsDirectory(const std::string& path);
 std::string Tsy_DataFile(const std::string& relative);
 
 // Reads a JSON document. A missing or malformed file throws Port::Exception

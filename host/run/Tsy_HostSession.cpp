@@ -20,21 +20,10 @@
 
 namespace {
 
-bool lowerEquals(const std::string& a, const std::string& b)
-{
-    return StringBase(a).EqualsNoCase(b);
-}
-
-bool isDirectory(const std::string& path)
-{
-    struct stat st {};
-    return ::stat(path.c_str(), &st) == 0 && S_ISDIR(st.st_mode);
-}
-
 // Creates the folder and its missing parents.
 bool makeDirectories(const std::string& path, std::string& error)
 {
-    if (path.empty() || isDirectory(path))
+    if (path.empty() || Tsy_IsDirectory(path))
         return true;
     size_t slash = path.find_last_of('/');
     if (slash != std::string::npos && slash > 0 && !makeDirectories(path.substr(0, slash), error))
@@ -163,9 +152,8 @@ std::string moduleNameProblem(const std::string& module)
         return "not a legal Verilog and VHDL name: it " + problem;
     // The module would clash with the primitives it instantiates (VHDL
     // names ignore case).
-    for (const auto& type : Tsy_PrimitiveLibrary::Instance().Types())
-        if (StringBase(type).EqualsNoCase(module))
-            return "the name of a library primitive; choose another module name";
+    if (Tsy_PrimitiveLibrary::Instance().FindNoCase(module))
+        return "the name of a library primitive; choose another module name";
     return std::string();
 }
 
@@ -201,7 +189,7 @@ bool Tsy_HostSession::readDesignHeader(const Tsy_RunOptions& o, std::string& err
     wizardKey_ = o.wizard.empty() ? header.wizard.str() : o.wizard;
     part_ = o.part.empty() ? header.part.str() : o.part;
     module_ = !o.module.empty() ? o.module : !header.module.IsEmpty() ? header.module.str() : kDefaultModule;
-    if (!o.designFile.empty() && !o.wizard.empty() && !lowerEquals(o.wizard, header.wizard.str())) {
+    if (!o.designFile.empty() && !o.wizard.empty() && !StringBase(o.wizard).EqualsNoCase(header.wizard.str())) {
         error = "--wizard " + o.wizard + ": " + o.designFile + " is a '" + header.wizard.str() + "' design";
         return false;
     }
@@ -265,15 +253,10 @@ bool Tsy_HostSession::makeDatabase(std::string&)
 
 bool Tsy_HostSession::makeWizard(std::string& error)
 {
-    std::string path = Tsy_PluginLoader::Locate(wizards_->PluginFile());
-    if (path.empty()) {
-        error = wizards_->PluginFile() + ": wizard plug-in not found";
+    const Tsy_PluginLoader* loader = Tsy_PluginLoader::Shared(wizards_->PluginFile(), error);
+    if (!loader)
         return false;
-    }
-    static Tsy_PluginLoader loader;
-    if (!loader.IsLoaded() && !loader.Load(path, error))
-        return false;
-    wizard_ = loader.Create(wizardKey_, options_.batch);
+    wizard_ = loader->Create(wizardKey_, options_.batch);
     if (!wizard_) {
         error = "--wizard " + wizardKey_ + ": this wizard type is not available in this build";
         return false;

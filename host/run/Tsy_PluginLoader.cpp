@@ -1,5 +1,6 @@
 #include "run/Tsy_PluginLoader.h"
 
+#include "lib/Tsy_DataDir.h"
 #include "wiz/Tsy_WizMain.h"
 
 #include <cstdlib>
@@ -7,16 +8,6 @@
 #include <unistd.h>
 
 namespace {
-
-std::string executableDir()
-{
-    char buf[4096];
-    ssize_t n = readlink("/proc/self/exe", buf, sizeof(buf) - 1);
-    if (n <= 0)
-        return ".";
-    std::string path(buf, static_cast<size_t>(n));
-    return path.substr(0, path.find_last_of('/'));
-}
 
 bool readable(const std::string& path)
 {
@@ -31,7 +22,9 @@ std::string Tsy_PluginLoader::Locate(const std::string& fileName)
     int n = 0;
     if (const char* env = std::getenv("PENDRA_PLUGIN_DIR"); env && *env)
         candidates[n++] = std::string(env) + "/" + fileName;
-    std::string exe = executableDir();
+    std::string exe = Tsy_ExecutableDir();
+    if (exe.empty())
+        exe = ".";
     candidates[n++] = exe + "/" + fileName;
     candidates[n++] = exe + "/../lib/pendra/" + fileName;
 #ifdef PENDRA_PLUGIN_BUILD_DIR
@@ -41,6 +34,19 @@ std::string Tsy_PluginLoader::Locate(const std::string& fileName)
         if (readable(candidates[i]))
             return candidates[i];
     return std::string();
+}
+
+const Tsy_PluginLoader* Tsy_PluginLoader::Shared(const std::string& fileName, std::string& error)
+{
+    static Tsy_PluginLoader loader;
+    if (loader.IsLoaded())
+        return &loader;
+    std::string path = Locate(fileName);
+    if (path.empty()) {
+        error = fileName + ": wizard plug-in not found";
+        return nullptr;
+    }
+    return loader.Load(path, error) ? &loader : nullptr;
 }
 
 bool Tsy_PluginLoader::Load(const std::string& path, std::string& error)

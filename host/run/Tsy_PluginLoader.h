@@ -19,6 +19,10 @@ public:
     // program, then lib/pendra beside it, then the build tree.
     static std::string Locate(const std::string& fileName);
 
+    // The process's one loader of the plug-in of that file name, loaded on
+    // first use; null with the reason when it cannot be found or loaded.
+    static const Tsy_PluginLoader* Shared(const std::string& fileName, std::string& error);
+
     // False with the reason when the library or its factory cannot be loaded.
     bool Load(const std::string& path, std::string& error);
     std::unique_ptr<Tsy_WizMain> Create(const StringBase& keyword, bool batch) const;
